@@ -1,0 +1,276 @@
+// kavu-cli: one computation run with the settings of the command line, as the
+// compute button would make it, with the window's questions answered for the
+// batch user.
+#include "cli/cli.h"
+
+#include <CLI/CLI.hpp>
+#include <algorithm>
+#include <array>
+#include <charconv>
+#include <cstdint>
+#include <exception>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "core/host.h"
+#include "core/messages.h"
+#include "core/run.h"
+#include "core/state.h"
+#include "core/tcvn3.h"
+
+namespace kavu {
+
+namespace {
+
+constexpr std::string_view kFooter =
+    R"(Products are written beside FILE and named after its path up to the first
+"." of the file name (NAME below):
+  --asc     the regenerated field book ../TRIDO/NAME.asc (beside FILE's folder)
+            and the companion file NAME.td1 (observations and coordinates)
+  --txt     the coordinate text file NAME.txt
+  --sketch  the field sketch NAME.sdo (with the seven header texts)
+  --dxf     the drawing exchange file NAME.dxf
+  --pegs    the auxiliary-peg file NAME.cp
+  --kc      the control-coordinate file NAME.kc
+The error report NAME.err and the station listing NAME.cpv are always written
+and are removed again when the run finds no data error. Instrument files
+(.sdr .gre .obs .set .idx .tcm) are first converted into the field book
+NAME.asc; for the other kinds NAME.asc must exist.
+
+Output: the summary (stations, detail points, errors, start and end times)
+goes to standard output, followed by a line "Không ghi được File: PATH" for
+each product that could not be written. Messages that stop a run go to
+standard error; so does the progress, when standard error is a terminal.
+
+Exit status:
+  0   the run completed without data errors
+  1   the run completed with data errors (see NAME.err), or a product could
+      not be written
+  2   the run did not start or stopped early (the message is on stderr)
+  64  bad usage)";
+
+// The seven header texts: option, meaning, default (the header form's).
+struct HeaderOption {
+  const char* name;
+  const char* help;
+  const char* fallback;
+};
+constexpr std::array<HeaderOption, 7> kHeaderOptions{{
+    {"--area", "survey area (field sketch header)", ""},
+    {"--sketch-no", "sketch number", "01"},
+    {"--instrument", "instrument model", "TOPCOM 226"},
+    {"--instrument-no", "instrument number", "23756"},
+    {"--surveyor", "surveyor", ""},
+    {"--recorder", "recorder", ""},
+    {"--date", "survey date", "Ngày  tháng năm 2003"},
+}};
+
+// Message boxes and the title, for a batch user: every box is written to the
+// error stream and answered with its default; the closing summary question is
+// not shown (the command prints the summary itself).
+class BatchHost : public Host {
+ public:
+  BatchHost(std::ostream& err, bool errIsTerminal) : err_(err), terminal_(errIsTerminal) {}
+
+  MsgAnswer MessageBox(std::string_view text, MsgIcon, MsgButtons buttons) override {
+    const bool summary = buttons == MsgButtons::YesNo && text.starts_with(msg::kTotalStations);
+    if (!summary) {
+      ClearProgress();
+      err_ << LoneCrAsLf(text) << '\n';
+      err_.flush();
+    }
+    return buttons == MsgButtons::YesNo ? MsgAnswer::Yes : MsgAnswer::Ok;
+  }
+
+  void SetTitle(std::string_view title) override {
+    if (!terminal_) return;
+    ClearProgress();
+    if (title == msg::kProgramTitle) return;  // the run is over
+    err_ << title;
+    err_.flush();
+    progressShown_ = true;
+  }
+
+  void Beep() override {}
+  void SetFileBox(std::string_view) override {}
+  void FocusFileBox() override {}
+  void SelectKind(int) override {}
+
+  void ClearProgress() {
+    if (!progressShown_) return;
+    err_ << "\r\x1b[K";
+    progressShown_ = false;
+  }
+
+ private:
+  static std::string LoneCrAsLf(std::string_view text) {
+    std::string out(text);
+    for (std::size_t i = 0; i < out.size(); ++i) {
+      if (out[i] == '\r' && (i + 1 == out.size() || out[i + 1] != '\n')) out[i] = '\n';
+    }
+    return out;
+  }
+
+  std::ostream& err_;
+  bool terminal_;
+  bool progressShown_ = false;
+};
+
+std::optional<int> ParseKind(std::string_view text) {
+  if (text == "auto") return -1;
+  if (text.size() == 1 && text[0] >= '0' && text[0] <= '9') return text[0] - '0';
+  return std::nullopt;
+}
+
+std::optional<std::uint64_t> ParseSeed(std::string_view text) {
+  std::uint64_t value = 0;
+  const auto [end, ec] = std::from_chars(text.data(), text.data() + text.size(), value);
+  if (ec != std::errc{} || end != text.data() + text.size() || text.empty()) return std::nullopt;
+  return value;
+}
+
+// The command line's settings, before they are turned into window fields.
+struct Settings {
+  std::string file;
+  std::string kind = "auto";
+  std::string scale = "1000";
+  std::string textHeight = "2.0";
+  std::string heightDecimals = "2";
+  bool asc = false, txt = false, sketch = false, dxf = false, pegs = false, kc = false;
+  bool all = false;
+  bool heights = true;
+  std::string controlFile;
+  std::string seed;
+  std::array<std::string, 7> header{};
+};
+
+int Usage(std::ostream& err, std::string_view what) {
+  err << "kavu-cli: " << what << "\nRun with --help for more information.\n";
+  return kExitUsage;
+}
+
+}  // namespace
+
+int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostream& err,
+           bool errIsTerminal) {
+  Settings set;
+  for (std::size_t i = 0; i < kHeaderOptions.size(); ++i) {
+    set.header[i] = kHeaderOptions[i].fallback;
+  }
+
+  CLI::App app{
+      "Computes the coordinates and heights of the detail points of a total-station "
+      "field book, checks every observation and writes the products asked for.",
+      "kavu-cli"};
+  app.footer(std::string(kFooter));
+  app.set_version_flag("--version", "kavu-cli 0.1");
+
+  app.add_option("FILE", set.file, "the field book (.asc) or instrument file to compute")
+      ->required();
+  auto* control = app.add_option(
+      "--control-file", set.controlFile,
+      "take the control points from this common control-point file instead of FILE's own "
+      "control-point records");
+  control->type_name("PATH");
+  app.add_option("--kind", set.kind,
+                 "kind of FILE: auto (from its extension), 0 field book, 1 SDR, 2 Sokkia "
+                 ".obs, 3 SET, 4 RAW, 5 Topcom .idx, 6 Topcom 226 .tcm, 7 GRE, 8 DN7, "
+                 "9 other (default: auto)")
+      ->type_name("auto|0..9");
+  app.add_option("--scale", set.scale,
+                 "map scale denominator; sets the distance and duplicate tolerance "
+                 "(default: 1000)")
+      ->type_name("TEXT");
+  app.add_option("--text-height", set.textHeight,
+                 "label height in millimetres for the drawing file (default: 2.0)")
+      ->type_name("TEXT");
+  app.add_option("--height-decimals", set.heightDecimals,
+                 "decimal places of the heights in the coordinate text file (default: 2)")
+      ->type_name("TEXT");
+
+  app.add_flag("--asc", set.asc, "write the regenerated field book and its companion file");
+  app.add_flag("--txt", set.txt, "write the coordinate text file");
+  app.add_flag("--sketch", set.sketch, "write the field sketch");
+  app.add_flag("--dxf", set.dxf, "write the drawing exchange file");
+  app.add_flag("--pegs", set.pegs, "write the auxiliary-peg file");
+  app.add_flag("--kc", set.kc, "write the control-coordinate file");
+  app.add_flag("--all", set.all, "write all six products");
+  app.add_flag("--heights,!--no-heights", set.heights,
+               "compute the heights of the detail points, or not (default: --heights)");
+  app.add_option("--seed", set.seed,
+                 "seed of the pseudo-random generator (readings made up for check records "
+                 "without one, orientation rows of the field sketch): the same seed gives the "
+                 "same products; without it the clock seeds it")
+      ->type_name("N");
+  for (std::size_t i = 0; i < kHeaderOptions.size(); ++i) {
+    const HeaderOption& h = kHeaderOptions[i];
+    std::string help = std::string(h.help) + " (default: \"" + h.fallback + "\")";
+    app.add_option(h.name, set.header[i], help)->type_name("TEXT");
+  }
+
+  // CLI11 takes the arguments in reverse order.
+  std::vector<std::string> reversed;
+  reversed.reserve(args.size());
+  for (auto it = args.rbegin(); it != args.rend(); ++it) reversed.emplace_back(*it);
+  try {
+    app.parse(reversed);
+  } catch (const CLI::Success& e) {
+    return app.exit(e, out, err) == 0 ? kExitOk : kExitUsage;
+  } catch (const CLI::ParseError& e) {
+    return Usage(err, e.what());
+  }
+
+  const std::optional<int> kind = ParseKind(set.kind);
+  if (!kind) return Usage(err, "--kind: expected auto or a number from 0 to 9, got: " + set.kind);
+  std::optional<std::uint64_t> seed;
+  if (!set.seed.empty() || app.count("--seed") > 0) {
+    seed = ParseSeed(set.seed);
+    if (!seed)
+      return Usage(err, "--seed: expected a whole number from 0 to 2^64-1, got: " + set.seed);
+  }
+
+  RunState st;
+  st.txtfile = set.file;
+  st.kindOverride = *kind;
+  st.TyleTXT = Utf8ToTcvn3(set.scale);
+  st.Htxt = Utf8ToTcvn3(set.textHeight);
+  st.txtSoleDC = Utf8ToTcvn3(set.heightDecimals);
+  const auto tick = [&](bool wanted) { return wanted || set.all ? 1 : 0; };
+  st.fasc = tick(set.asc);
+  st.ftd = tick(set.txt);
+  st.fsdo = tick(set.sketch);
+  st.fdxf = tick(set.dxf);
+  st.fcp = tick(set.pegs);
+  st.fkc = tick(set.kc);
+  st.fdc = set.heights ? 1 : 0;
+  if (app.count("--control-file") > 0) {
+    st.ckKC = 1;
+    st.txtFKC = set.controlFile;
+  }
+  st.seed = seed;
+  for (std::size_t i = 0; i < set.header.size(); ++i) st.nhapsdo[i] = Utf8ToTcvn3(set.header[i]);
+
+  BatchHost host(err, errIsTerminal);
+  RunResult result;
+  try {
+    result = tinh_Click(st, host);
+  } catch (const std::exception& e) {
+    host.ClearProgress();
+    err << "kavu-cli: the run failed: " << e.what() << '\n';
+    return kExitStopped;
+  }
+  host.ClearProgress();
+  if (result.outcome != RunOutcome::Completed) return kExitStopped;
+
+  const std::vector<std::string> lines = SummaryLines(result);
+  for (const std::string& line : lines) out << line << '\n';
+  for (const std::string& path : result.unwritable) {
+    const std::string line = std::string(msg::kCannotWrite) + path;
+    if (std::find(lines.begin(), lines.end(), line) == lines.end()) out << line << '\n';
+  }
+  out.flush();
+  return result.err > 0 || !result.unwritable.empty() ? kExitDataErrors : kExitOk;
+}
+
+}  // namespace kavu

@@ -1,0 +1,48 @@
+// Number rules shared by the engine, the converters and every product.
+// Nothing here looks at the locale: a Vietnamese desktop writes decimal commas,
+// our files never do.
+#pragma once
+
+#include <string>
+#include <string_view>
+
+namespace kavu {
+
+// Numeric value of a text: leading blanks skipped; spaces, tabs and LF inside
+// the number ignored; optional sign, digits, one ".", optional exponent
+// E/e/D/d with its sign; stops at the first other character. No digit gives 0;
+// a value beyond double range gives 0.
+double Val(std::string_view text);
+
+// True when Val finds at least one digit in the text's numeric prefix.
+bool HasNumber(std::string_view text);
+
+// Nearest whole number, ties to the even neighbour (2.5 -> 2, 3.5 -> 4).
+double RoundEvenWhole(double x);
+
+// Round(x, n): x·10^n rounded to even, divided by 10^n; x unchanged when
+// |x·10^n| >= 2^52.
+double RoundEven(double x, int n);
+
+// Fix: the fraction dropped toward zero.
+double Fix(double x);
+
+// Number masks ("##0", "00", "0000000", "####0.000", "#######.000"...):
+// x·10^d rounded half away from zero; "0" digits always written, "#" digits
+// only when significant; no minus sign on a zero result.
+std::string Mask(double x, std::string_view mask);
+
+// Ordinary number text: at most 15 significant digits, exponent form below
+// 1E-4 or from 1E+15 ("1E+15", "1E-05", "1.5E+20"), "0." shortened to ".",
+// zero is "0".
+std::string NumberText(double x);
+
+// Number form of report lines: a space (or the minus), the number text of the
+// magnitude, one space (' 3 ', '-.12 ', ' 0 ').
+std::string ReportNumber(double x);
+
+// Whole number written as its decimal text with a space in the sign position
+// (the summary's counts: ' 12').
+std::string SignedCount(long long value);
+
+}  // namespace kavu

@@ -1,0 +1,346 @@
+#include "core/run.h"
+
+#include <ctime>
+#include <filesystem>
+#include <string>
+
+#include "core/messages.h"
+#include "core/numbers.h"
+#include "core/reports.h"
+#include "core/station.h"
+#include "core/tcvn3.h"
+#include "core/text.h"
+#include "import/dispatch.h"
+#include "products/control_points.h"
+#include "products/dxf.h"
+#include "products/lookup.h"
+#include "products/pegs.h"
+#include "products/sketch.h"
+
+namespace kavu {
+namespace {
+
+std::string TimeOfDay() {
+  const std::time_t now = std::time(nullptr);
+  std::tm local{};
+#ifdef _WIN32
+  localtime_s(&local, &now);
+#else
+  localtime_r(&now, &local);
+#endif
+  char text[16];
+  const std::size_t length = std::strftime(text, sizeof text, "%H:%M:%S", &local);
+  return std::string(text, length);
+}
+
+// Distance tolerance in metres for the map scale 1:T.
+double DistanceTolerance(double scale) {
+  if (scale <= 500) return 0.02;
+  if (scale <= 2000) return 0.05;
+  if (scale < 5000) return 0.3;
+  return 2.0;
+}
+
+// The working copy, read strictly forward. Reading past its end gives an
+// empty line.
+class WorkingCopy {
+ public:
+  explicit WorkingCopy(RunState& st) : st_(st) {}
+  bool AtEnd() const { return next_ >= st_.tamsl.size(); }
+  void ReadLine() {
+    st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
+    st_.MangTruong = SplitFields(st_.dong);
+    st_.stp = static_cast<int>(st_.MangTruong.size());
+  }
+  const std::string& Field0() const {
+    static const std::string kNone;
+    return st_.MangTruong.empty() ? kNone : st_.MangTruong[0];
+  }
+
+ private:
+  RunState& st_;
+  std::size_t next_ = 0;
+};
+
+const std::string& FieldOf(const RunState& st, std::size_t i) {
+  static const std::string kNone;
+  return i < st.MangTruong.size() ? st.MangTruong[i] : kNone;
+}
+
+bool StartsWith(std::string_view text, std::string_view prefix) {
+  return text.substr(0, prefix.size()) == prefix;
+}
+
+// The lengths of the two lists of the regenerated field book stay equal to
+// the count of its lines.
+void DropStationEntries(RunState& st, std::size_t keep) {
+  st.MangSoLieuASC.resize(keep);
+  if (st.MangSoLieuToaDo.size() > keep) st.MangSoLieuToaDo.resize(keep);
+}
+
+void HandleBodyRecord(RunState& st) {
+  const std::size_t stp = st.MangTruong.size();
+  auto codeIsPegName = [&] {
+    std::string& code = st.MangTruong[5];
+    const int notDigits = KTraCCG(code);
+    return code.size() > 2 && notDigits == 1;
+  };
+  if (stp == 7) {
+    if (Upper(st.MangTruong[6]) == "KT") {
+      STP7(st);
+    } else if (codeIsPegName()) {
+      STP6(st);
+    } else {
+      STP5(st);
+    }
+  } else if (stp == 6) {
+    if (codeIsPegName()) {
+      STP6(st);
+    } else {
+      STP5(st);
+    }
+  } else if (stp == 5) {
+    STP5(st);
+  }
+  const std::string name = Trim(st.TenDiem.str());
+  if (stp < 5 && name != "TR" && name != "DKD") {
+    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether));
+  }
+}
+
+struct Counters {
+  int stations = 0;
+  long long bodyRecords = 0;
+};
+
+void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& counters) {
+  host.SetTitle(std::string(msg::kStationTitle) + Tcvn3ToUtf8(st.TenTram.str()));
+  ++counters.stations;
+  TinhPhuongViCanh(st);
+  st.cdhdau = RoundEven(st.cdh, 3);
+  st.pvd = st.gpv;
+  st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
+  if (Ticked(st.fsdo)) {
+    st.TenDinhHuong2 = "";
+    st.StXDinhHuong2.clear();
+    st.StYDinhHuong2.clear();
+    st.StSaiGoc.clear();
+  }
+  const std::string stationLine = "TR " + st.TenTram.str() + " " + st.ccm;
+  const std::string orientationLine = "DKD " + st.TenDinhHuong.str();
+  st.MangSoLieuToaDo.resize(st.MangSoLieuASC.size());
+  for (const std::string& line : {stationLine, orientationLine}) {
+    st.MangSoLieuASC.push_back(line);
+    st.MangSoLieuToaDo.push_back(line);
+  }
+  const std::size_t bodyStart = st.MangSoLieuASC.size();
+
+  // An orientation record on the last line leaves the station without a body.
+  const bool hasBody = !copy.AtEnd();
+  copy.ReadLine();
+  st.TenDiem = copy.Field0();
+  st.DiemDau = "";
+  st.DiemCuoi = "";
+  st.dctdau = 1;
+  st.DongDinhHuong2.clear();
+  while (hasBody && Trim(st.TenDiem.str()) != "TR") {
+    ++counters.bodyRecords;
+    HandleBodyRecord(st);
+    if (copy.AtEnd()) break;
+    copy.ReadLine();
+    st.TenDiem = copy.Field0();
+  }
+  if (st.MangSoLieuASC.size() == bodyStart) DropStationEntries(st, bodyStart - 2);
+  st.cpvFile.Line(st.DongTram + "    " + st.DiemDau.str() + " -  " + st.DiemCuoi.str());
+  insodo(st);
+  incocphu(st);
+}
+
+void SkipStation(RunState& st, WorkingCopy& copy) {
+  st.dctdau = 1;
+  while (copy.Field0() != "TR" && !copy.AtEnd()) {
+    copy.ReadLine();
+    if (st.dctdau == 1) {
+      st.DiemDau = copy.Field0();
+      st.DiemCuoi = copy.Field0();
+      st.dctdau = 2;
+    } else {
+      st.DiemCuoi = st.TenDiem.str();
+    }
+    st.TenDiem = copy.Field0();
+  }
+  st.errFile.Line(std::string(msg::kSkippedFrom) + st.DiemDau.str() + std::string(msg::kSkippedTo) +
+                  st.DiemCuoi.str() + std::string(msg::kSkippedEnd));
+}
+
+// Station and orientation records of a block; I = 0 when it cannot be computed.
+void ReadStationHeader(RunState& st, WorkingCopy& copy) {
+  st.I = 1;
+  st.MangSoLieuSoDo.clear();
+  st.MangCocPhu.clear();
+  if (StartsWith(copy.Field0(), "TR") && st.stp >= 2) {
+    st.TenKC = FieldOf(st, 1);
+    st.ccm = FieldOf(st, 2);
+    st.DongTram = st.TenKC.str();
+    if (st.stp == 2) {
+      ReportError(st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
+    }
+    TimToaDoDiem(st);
+    st.TenTram = st.TenKC.str();
+    if (st.n != 0) {
+      st.xTR = st.X;
+      st.yTR = st.Y;
+      st.zTR = st.Z;
+      st.StXTram = st.StX.str();
+      st.StYTram = st.StY.str();
+      st.StZTram = st.StZ.str();
+    } else {
+      st.I = 0;
+      st.StXTram.clear();
+      st.StYTram.clear();
+      st.StZTram.clear();
+    }
+  } else {
+    st.I = 0;
+    ReportError(st, std::string(msg::kPointColon) + copy.Field0() +
+                        Utf8ToTcvn3(msg::kStationRunTogether));
+  }
+
+  copy.ReadLine();
+  if (StartsWith(copy.Field0(), "DKD") && st.stp >= 2) {
+    st.TenKC = FieldOf(st, 1);
+    st.DongTram += st.TenKC.str();
+    TimToaDoDiem(st);
+    st.TenDinhHuong = st.TenKC.str();
+    if (st.n != 0) {
+      st.xDKD = st.X;
+      st.yDKD = st.Y;
+      st.zDKD = st.Z;
+      st.StXDinhHuong = st.StX.str();
+      st.StYDinhHuong = st.StY.str();
+      st.StZDinhHuong = st.StZ.str();
+    } else {
+      st.I = 0;
+      st.StXDinhHuong.clear();
+      st.StYDinhHuong.clear();
+      st.StZDinhHuong.clear();
+    }
+  } else {
+    st.I = 0;
+    ReportError(st, std::string(msg::kPointColon) + copy.Field0() +
+                        std::string(msg::kOrientationRunTogether));
+  }
+}
+
+void CloseKeptFile(RunState& st, TextOut& file) {
+  if (file.is_open() && !file.close()) st.unwritable.push_back(file.path().string());
+}
+
+void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
+  if (!file.open(path)) st.unwritable.push_back(path);
+}
+
+RunResult Finish(RunState& st, RunOutcome outcome) {
+  RunResult result;
+  result.outcome = outcome;
+  result.err = st.err;
+  result.unwritable = st.unwritable;
+  return result;
+}
+
+}  // namespace
+
+std::vector<std::string> SummaryLines(const RunResult& result) {
+  return {
+      std::string(msg::kTotalStations) + SignedCount(result.stations),
+      std::string(msg::kTotalPoints) + SignedCount(result.bodyRecords),
+      std::string(msg::kTotalErrors) + SignedCount(result.err),
+      std::string(msg::kStarted) + result.startTime,
+      std::string(msg::kEnded) + result.endTime,
+  };
+}
+
+RunResult tinh_Click(RunState& st, Host& host) {
+  st.ResetComputation();
+  st.rng = st.seed ? SplitMix64(*st.seed) : SplitMix64::FromClock();
+  const std::string startTime = TimeOfDay();
+
+  const auto fieldBook = CheckAndConvert(st, host);
+  if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
+
+  if (Ticked(st.fcp)) OpenKeptFile(st, st.cpFile, st.daufile + ".cp");
+  if (Ticked(st.fsdo)) OpenKeptFile(st, st.sdoFile, st.daufile + ".sdo");
+  OpenKeptFile(st, st.errFile, st.daufile + ".err");
+  WriteErrorReportHeader(st.errFile);
+  OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
+  WriteStationListingHeader(st.cpvFile);
+
+  st.Tyle = st.TyleTXT;
+  st.Htext = st.Htxt;
+  st.dscdh = DistanceTolerance(Val(st.Tyle));
+
+  auto closeAll = [&] {
+    CloseKeptFile(st, st.cpvFile);
+    CloseKeptFile(st, st.errFile);
+  };
+  if (!DocFileKhongChe(st, host, *fieldBook)) {
+    closeAll();
+    CloseKeptFile(st, st.cpFile);
+    CloseKeptFile(st, st.sdoFile);
+    return Finish(st, RunOutcome::StoppedEarly);
+  }
+  st.ChuoiKC.clear();
+  if (st.tamsl.empty()) {
+    host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
+    st.txtfile.clear();
+    host.SetFileBox("");
+    host.FocusFileBox();
+    closeAll();
+    CloseKeptFile(st, st.cpFile);
+    CloseKeptFile(st, st.sdoFile);
+    return Finish(st, RunOutcome::StoppedEarly);
+  }
+
+  Counters counters;
+  WorkingCopy copy(st);
+  copy.ReadLine();
+  while (!copy.AtEnd()) {
+    ReadStationHeader(st, copy);
+    if (st.I != 0) {
+      ComputeStation(st, host, copy, counters);
+    } else {
+      SkipStation(st, copy);
+    }
+  }
+
+  closeAll();
+  WriteTextProducts(st);
+  if (Ticked(st.fdxf) && !indxf(st)) st.unwritable.push_back(st.daufile + ".dxf");
+  CloseKeptFile(st, st.cpFile);
+  CloseKeptFile(st, st.sdoFile);
+  if (st.err == 0) {
+    std::error_code ignored;
+    for (const char* extension : {".err", ".cpv", ".bak"}) {
+      std::filesystem::remove(st.daufile + extension, ignored);
+    }
+  }
+
+  RunResult result = Finish(st, RunOutcome::Completed);
+  result.stations = counters.stations;
+  result.bodyRecords = counters.bodyRecords;
+  result.startTime = startTime;
+  host.SetTitle(msg::kProgramTitle);
+  result.endTime = TimeOfDay();
+
+  std::string text;
+  for (const std::string& line : SummaryLines(result)) text += line + "\r";
+  for (const std::string& path : result.unwritable) {
+    text += std::string(msg::kCannotWrite) + path + "\r";
+  }
+  text += "\r" + std::string(msg::kContinue);
+  result.answer = host.MessageBox(text, MsgIcon::Information, MsgButtons::YesNo);
+  host.Beep();
+  return result;
+}
+
+}  // namespace kavu

@@ -1,0 +1,152 @@
+// The state that the routines of one computation run share, under the names
+// the surveying office uses. The window's controls and the file-selection
+// fields outlive a run; the computation fields are reset at the start of each.
+#pragma once
+
+#include <array>
+#include <cstdint>
+#include <optional>
+#include <string>
+#include <vector>
+
+#include "core/angles.h"
+#include "core/lines.h"
+#include "core/random.h"
+#include "core/text.h"
+
+namespace kavu {
+
+// A check box counts as ticked only in state 1 (2 is the grayed third state).
+inline bool Ticked(int state) { return state == 1; }
+
+// The values of the main window's controls that the run reads or sets.
+struct WindowFields {
+  std::string txtfile;  // the chosen file's path, native
+  int cbkieu = 0;       // kind of input, 0 to 9
+  int fasc = 0;         // regenerated field book and companion file
+  int ftd = 1;          // coordinate text file
+  int fdc = 1;          // detail heights
+  int fsdo = 2;         // field sketch (grayed until clicked)
+  int fdxf = 2;         // drawing file (grayed until clicked)
+  int fcp = 0;          // auxiliary-peg file
+  int fkc = 0;          // control-coordinate file
+  int ckKC = 0;         // control points from the common file
+  std::string TyleTXT = "1000";  // map scale denominator, as typed
+  std::string Htxt = "2.0";      // label height in mm, as typed
+  std::string txtSoleDC = "2";   // decimals of heights, as typed
+  std::string txtFKC;            // common control-point file, native path
+  // The seven texts of the header form (TCVN3): survey area, sketch number,
+  // instrument, instrument number, surveyor, recorder, survey date.
+  std::array<std::string, 7> nhapsdo{};
+  // A fixed seed for the generator (batch use); without it, the clock.
+  std::optional<std::uint64_t> seed;
+  // A kind chosen by the user over the one of the extension (batch use), or -1.
+  int kindOverride = -1;
+};
+
+// Names derived from the chosen path; every product is daufile + extension.
+struct FileSelection {
+  std::string filesl;    // full path of the file to compute
+  std::string tentm;     // its folder, with the trailing separator
+  std::string daufile;   // the path up to the first "." of the file name
+  std::string duoifile;  // between the first and second "." of the file name
+  std::string tentmbd;   // the folder's parent + "TRIDO" + separator
+  std::string filesl1;   // tentmbd + the name up to its first "." + ".asc"
+  // The field sketch's copy of the header texts at their fixed widths
+  // (39, 6, 19, 20, 17, 18, 10).
+  std::array<std::string, 7> nhap{};
+};
+
+// A known point: name, X, Y, H as texts.
+using KnownPoint = std::array<std::string, 4>;
+// A computed point: name (12), X, Y, H, code, note.
+using DetailPoint = std::array<std::string, 6>;
+// A field-sketch row: name, horizontal angle, distance, vertical angle, prism
+// height, note.
+using SketchRow = std::array<std::string, 6>;
+// An auxiliary peg: blank, name, reading, distance, zenith, prism height, note.
+using PegEntry = std::array<std::string, 7>;
+
+struct ComputationFields {
+  std::int32_t err = 0;  // data errors written to the error report
+  SplitMix64 rng;        // draws for check records and sketch orientation rows
+
+  // Current line of the working copy and its fields.
+  std::string dong;
+  std::vector<std::string> MangTruong;
+  int stp = 0;
+
+  // Angle and distance of the current observation.
+  double goc = 0, s = 0, rad = 0;
+  double do1 = 0;
+  std::int16_t phut = 0;
+  double giay = 0;
+  std::string StGoc;
+
+  // Station and orientation.
+  int I = 1;
+  int n = 0;
+  FixedText<12> TenKC, TenTram, TenDinhHuong, TenDiem;
+  std::string StXTram, StYTram, StZTram;
+  std::string StXDinhHuong, StYDinhHuong, StZDinhHuong;
+  double xTR = 0, yTR = 0, zTR = 0;
+  double xDKD = 0, yDKD = 0, zDKD = 0;
+  std::string ccm;
+  FixedText<5> DiemDau, DiemCuoi;
+  std::int16_t dctdau = 1;
+  std::string DongTram;
+  std::string DongDinhHuong2;
+  FixedText<12> TenDinhHuong2;
+  std::string StXDinhHuong2, StYDinhHuong2, StSaiGoc;
+  double pvd = 0, cdhdau = 0, dscdh = 0.05;
+  double gpv = 0, cdh = 0;
+  std::string Tyle, Htext;
+
+  // The current point.
+  double GocD = 0, ccg = 0;
+  double dx = 0, dy = 0, dz = 0;
+  double xi = 0, yi = 0, zi = 0;
+  double pv2 = 0, scgcd = 0;
+  double X = 0, Y = 0, Z = 0;
+  FixedText<11> StX;
+  FixedText<10> StY, StZ;
+  FixedText<8> StS, StCanh;
+
+  // Tables of the run.
+  std::vector<KnownPoint> MangKhongChe;
+  std::vector<DetailPoint> MangToaDoChiTiet;
+  std::vector<std::string> MangSoLieuASC;
+  std::vector<std::string> MangSoLieuToaDo;
+  std::vector<SketchRow> MangSoLieuSoDo;
+  std::vector<PegEntry> MangCocPhu;
+  std::string ChuoiKC;
+
+  int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
+  int sdtd() const { return static_cast<int>(MangToaDoChiTiet.size()); }
+  int sdasc() const { return static_cast<int>(MangSoLieuASC.size()); }
+  int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
+  int sdcp() const { return static_cast<int>(MangCocPhu.size()); }
+
+  // The working copy of the field book (without its control-point records),
+  // held in memory so that runs never share a file.
+  std::vector<std::string> tamsl;
+
+  // Files kept open through the station loop.
+  TextOut errFile;  // error report .err
+  TextOut cpvFile;  // station listing .cpv
+  TextOut sdoFile;  // field sketch .sdo
+  TextOut cpFile;   // auxiliary-peg file .cp
+
+  // Products that could not be written, named in the summary.
+  std::vector<std::string> unwritable;
+};
+
+struct RunState : WindowFields, FileSelection, ComputationFields {
+  // Starts a run's computation afresh; the window and file fields stay.
+  void ResetComputation() { static_cast<ComputationFields&>(*this) = ComputationFields{}; }
+};
+
+// Appends an empty line and a message line to the error report and counts it.
+void ReportError(RunState& st, std::string_view line);
+
+}  // namespace kavu

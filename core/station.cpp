@@ -1,0 +1,239 @@
+#include "core/station.h"
+
+#include <cmath>
+#include <string>
+
+#include "core/messages.h"
+#include "core/numbers.h"
+#include "core/tcvn3.h"
+#include "products/lookup.h"
+#include "products/results.h"
+
+namespace kavu {
+namespace {
+
+// Field i of the current record, or the empty text past the last field.
+const std::string& Field(const RunState& st, std::size_t i) {
+  static const std::string kNone;
+  return i < st.MangTruong.size() ? st.MangTruong[i] : kNone;
+}
+
+void EntryError(RunState& st, std::string_view message) {
+  ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message));
+}
+
+// A record whose reading, zenith angle or prism height holds no number cannot
+// be computed: it is reported and passed over.
+bool NumbersMissing(RunState& st, std::initializer_list<std::size_t> fields) {
+  for (std::size_t i : fields) {
+    if (!HasNumber(Field(st, i))) {
+      EntryError(st, msg::kNotANumber);
+      return true;
+    }
+  }
+  return false;
+}
+
+// Azimuth and distance from (xFrom, yFrom) to the station, reported against
+// the station and otherName.
+void Orient(RunState& st, const std::string& otherName) {
+  const double dx = st.xTR - st.xDKD;
+  const double dy = st.yTR - st.yDKD;
+  // The angle is held in single precision, as the office's tables were made.
+  float theta;
+  if (dx > 0) {
+    theta = static_cast<float>(std::atan(dy / dx));
+  } else if (dx < 0) {
+    theta = static_cast<float>(std::atan(dy / dx) + kPi);
+  } else {
+    theta = static_cast<float>(dy >= 0 ? kPi / 2 : kPi / 2 + kPi);
+  }
+  st.gpv = static_cast<double>(theta) * 180 / kPi;
+  if (st.gpv < 0) st.gpv += 360;
+  if (st.gpv >= 360) st.gpv -= 360;
+  st.goc = st.gpv;
+  GocString(st);
+  st.cdh = std::sqrt(dx * dx + dy * dy);
+  if (st.cdh > 10000) {
+    ReportError(st, std::string(msg::kPointColon) + st.TenTram.str() + std::string(msg::kOr) +
+                        otherName + std::string(msg::kWrongCoordinates));
+  }
+  st.StCanh = Mask(RoundEven(st.cdh, 3), "####.000");
+  const std::string trimmed = Trim(st.StCanh.str());
+  if (trimmed.size() < 8) st.StCanh = std::string(8 - trimmed.size(), ' ') + trimmed;
+}
+
+}  // namespace
+
+void gocdo(RunState& st) {
+  if (st.goc < 0) {
+    st.goc = std::fabs(st.goc);
+    EntryError(st, msg::kNegativeAngle);
+  }
+  if (st.s < 0) {
+    st.s = std::fabs(st.s);
+    EntryError(st, msg::kNegativeDistance);
+  }
+  // Integer division and remainder work on the angle rounded to a whole number.
+  const double whole = RoundEvenWhole(st.goc);
+  st.do1 = std::trunc(whole / 10000);
+  const double minutesAndSeconds = std::fmod(whole, 10000);
+  st.phut = static_cast<std::int16_t>(std::trunc(minutesAndSeconds / 100));
+  st.giay = RoundEven((st.goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
+  if (st.do1 >= 360) {
+    EntryError(st, msg::kWrongDegrees);
+    st.do1 = std::fmod(st.do1, 360);
+  }
+  if (st.phut >= 60) EntryError(st, msg::kWrongMinutes);
+  if (st.giay >= 60) EntryError(st, msg::kWrongSeconds);
+  if (st.s > 2000 || st.s < 0) EntryError(st, msg::kDistanceMayBeWrong);
+  st.goc = (st.do1 + st.phut / 60.0) + st.giay / 3600;
+  st.rad = st.goc * kPi / 180;
+}
+
+void GocString(RunState& st) {
+  AngleParts parts;
+  st.StGoc = GocStringText(st.goc, &parts);
+  st.do1 = parts.do1;
+  st.phut = parts.phut;
+  st.giay = parts.giay;
+}
+
+void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
+
+void TinhDoCao(RunState& st) {
+  gocdo(st);
+  GocString(st);
+  st.GocD = st.goc;
+  st.goc = 90 - st.goc;
+  st.rad = st.goc * kPi / 180;
+  st.dz = std::tan(st.rad) * st.s;
+  st.zi = st.zTR + st.dz + Val(st.ccm) - st.ccg;
+  st.StZ = Mask(st.zi, "######.000");
+}
+
+void TinhToaDo(RunState& st) {
+  gocdo(st);
+  GocString(st);
+  // The azimuth is held in single precision at every step.
+  float a = static_cast<float>((st.pvd + st.goc) - 180);
+  if (a < 0) a = static_cast<float>(a + 360.0);
+  if (a >= 360) a = static_cast<float>(a - 360.0);
+  a = static_cast<float>(a * kPi / 180.0000001);
+  st.dx = std::cos(static_cast<double>(a)) * st.s;
+  st.dy = std::sin(static_cast<double>(a)) * st.s;
+  st.xi = RoundEven(st.xTR + st.dx, 3);
+  st.yi = RoundEven(st.yTR + st.dy, 3);
+  st.s = RoundEven(st.s, 3);
+  st.StX = Mask(st.xi, "#######.000");
+  st.StY = Mask(st.yi, "######.000");
+  st.StS = Mask(st.s, "#####.000");
+}
+
+void STP5(RunState& st) {
+  if (NumbersMissing(st, {1, 3, 4})) return;
+  st.MangSoLieuASC.push_back(st.dong);
+  if (st.dctdau == 1) {
+    st.DiemDau = st.TenDiem.str();
+    st.DiemCuoi = st.TenDiem.str();
+    st.dctdau = 2;
+  } else {
+    st.DiemCuoi = st.TenDiem.str();
+  }
+  st.s = Val(Field(st, 2));
+  st.goc = Val(Field(st, 3));
+  st.ccg = Val(Field(st, 4));
+  TinhDoCao(st);
+  st.goc = Val(Field(st, 1));
+  TinhToaDo(st);
+  GhiMangToaDoChiTiet(st);
+  GhiMangSoLieuToaDo(st);
+  GhiMangSoLieuVaoSoDo(st);
+}
+
+void STP6(RunState& st) {
+  st.TenKC = Field(st, 5);
+  if (st.TenKC == st.TenTram || st.TenKC == st.TenDinhHuong) {
+    // An orientation distance record: only the distance counts.
+    st.s = Val(Field(st, 2));
+    if (st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
+      ReportError(st, std::string(msg::kStation) + st.TenTram.str() + Utf8ToTcvn3(msg::kOrientation) +
+                          st.TenDinhHuong.str() + std::string(msg::kWrongOrientationDistance) +
+                          std::string(msg::kDS) + ReportNumber(RoundEven(st.s - st.cdhdau, 2)));
+    }
+    return;
+  }
+  if (NumbersMissing(st, {1, 3, 4})) return;
+  st.MangSoLieuASC.push_back(st.dong);
+  st.s = Val(Field(st, 2));
+  st.goc = Val(Field(st, 3));
+  st.ccg = Val(Field(st, 4));
+  TinhDoCao(st);
+  st.goc = Val(Field(st, 1));
+  TinhToaDo(st);
+  // The peg becomes a known point for the rest of the run.
+  st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
+  std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
+  if (st.stp > 6) line += " " + Field(st, 6);
+  st.ChuoiKC += line + "\r\n";
+  st.MangCocPhu.push_back({"", Field(st, 5), Field(st, 1), Field(st, 2), Field(st, 3),
+                           Field(st, 4), st.stp > 6 ? Field(st, 6) : std::string()});
+}
+
+void STP7(RunState& st) {
+  if (NumbersMissing(st, {1})) return;
+  st.TenKC = Field(st, 5);
+  st.TenDinhHuong2 = st.TenKC.str();
+  st.DongDinhHuong2 = "DKD2 " + st.TenKC.str();
+  // The record's own distance is the one checked.
+  st.s = Val(Field(st, 2));
+  st.goc = Val(Field(st, 1));
+  gocdo(st);
+  st.pv2 = st.goc;
+  TimToaDoDiem(st);
+  const bool found = st.n != 0;
+  if (found) {
+    st.xDKD = st.X;
+    st.yDKD = st.Y;
+    st.StXDinhHuong2 = st.StX.str();
+    st.StYDinhHuong2 = st.StY.str();
+    Orient(st, st.TenDinhHuong2.str());
+    st.scgcd = st.gpv - st.pvd;
+    if (st.scgcd >= 360) st.scgcd -= 360;
+    if (st.scgcd < 0) st.scgcd += 360;
+    st.scgcd = st.pv2 - st.scgcd;
+    st.goc = st.scgcd;
+    GocString(st);
+    st.StSaiGoc = st.StGoc;
+  }
+  const double r = st.rng.Next();
+  if (!found) {
+    // Without the check point nothing can be computed: keep the reading as
+    // written rather than make one up.
+    st.StSaiGoc.clear();
+    st.StXDinhHuong2.clear();
+    st.StYDinhHuong2.clear();
+    st.DongDinhHuong2 += " " + Field(st, 1);
+  } else if (Val(Trim(Field(st, 1))) != 0) {
+    st.DongDinhHuong2 += " " + Field(st, 1);
+  } else {
+    // No reading was recorded: make one from the computed angle, within half
+    // a minute of it.
+    st.goc = std::fabs(st.scgcd);
+    if (r < 0.3) {
+      st.goc -= r * 45 / 3600;
+    } else if (r > 0.3 && r <= 0.6) {
+      st.goc += r * 39 / 3600;
+    } else if (r > 0.6 && r <= 0.8) {
+      st.goc -= r * 36 / 3600;
+    } else if (r > 0.8) {
+      st.goc += r * 32 / 3600;
+    }
+    GocString(st);
+    st.StGoc = Trim(Mask(Val(st.StGoc), "#######"));
+    st.DongDinhHuong2 += " " + st.StGoc;
+  }
+  st.DongDinhHuong2 += " " + Field(st, 2);
+}
+
+}  // namespace kavu

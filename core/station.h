@@ -1,0 +1,25 @@
+// The surveying mathematics of a station and the routines of its records.
+#pragma once
+
+#include "core/state.h"
+
+namespace kavu {
+
+// Decodes the packed angle in goc, checks it and the distance s, reports entry
+// errors against TenDiem.
+void gocdo(RunState& st);
+// StGoc = the text of goc (decimal degrees).
+void GocString(RunState& st);
+
+// Azimuth and distance from the orientation point to the station.
+void TinhPhuongViCanh(RunState& st);
+// Height of the current point from its zenith angle.
+void TinhDoCao(RunState& st);
+// Plane coordinates of the current point.
+void TinhToaDo(RunState& st);
+
+void STP5(RunState& st);  // detail record
+void STP6(RunState& st);  // peg or orientation distance record
+void STP7(RunState& st);  // check record
+
+}  // namespace kavu

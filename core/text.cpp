@@ -1,0 +1,79 @@
+#include "core/text.h"
+
+namespace kavu {
+
+std::string_view TrimView(std::string_view text) {
+  const std::size_t first = text.find_first_not_of(' ');
+  if (first == std::string_view::npos) return {};
+  const std::size_t last = text.find_last_not_of(' ');
+  return text.substr(first, last - first + 1);
+}
+
+std::string Trim(std::string_view text) { return std::string(TrimView(text)); }
+
+std::string Upper(std::string_view text) {
+  std::string out(text);
+  for (char& c : out) {
+    if (c >= 'a' && c <= 'z') c = static_cast<char>(c - 'a' + 'A');
+  }
+  return out;
+}
+
+std::string FixedWidth(std::string_view text, std::size_t width) {
+  std::string out(text.substr(0, width));
+  out.resize(width, ' ');
+  return out;
+}
+
+namespace {
+
+// The decision is taken on the untrimmed length, the padding on the trimmed
+// text: ' ab ' in 5 gives '   ab'.
+std::string Align(std::string_view text, int width, bool right) {
+  if (width < 0 || text.size() >= static_cast<std::size_t>(width)) return std::string(text);
+  const std::string_view core = TrimView(text);
+  const std::string pad(static_cast<std::size_t>(width) - core.size(), ' ');
+  return right ? pad + std::string(core) : std::string(core) + pad;
+}
+
+}  // namespace
+
+std::string RString(std::string_view text, int width) { return Align(text, width, true); }
+
+std::string LString(std::string_view text, int width) { return Align(text, width, false); }
+
+int KTraCCG(std::string& text) {
+  text = Trim(text);
+  int result = 0;
+  for (const char c : text) {
+    if (!((c >= '0' && c <= '9') || c == '.')) result = 1;
+  }
+  return result;
+}
+
+std::vector<std::string> SplitFields(std::string& line) {
+  std::string normal;
+  normal.reserve(line.size());
+  for (char c : line) {
+    if (c == '\t') c = ' ';
+    if (c == ' ' && !normal.empty() && normal.back() == ' ') continue;
+    normal.push_back(c);
+  }
+  line = normal;
+
+  std::vector<std::string> fields;
+  if (line.empty()) return fields;
+  std::size_t start = 0;
+  for (;;) {
+    const std::size_t space = line.find(' ', start);
+    if (space == std::string::npos) {
+      fields.push_back(line.substr(start));
+      break;
+    }
+    fields.push_back(line.substr(start, space - start));
+    start = space + 1;
+  }
+  return fields;
+}
+
+}  // namespace kavu

@@ -1,0 +1,54 @@
+// Text rules: fixed-width fields, column alignment, the field splitter.
+// Every text here is TCVN3 bytes, one byte per character.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+#include <vector>
+
+namespace kavu {
+
+// Removes leading and trailing spaces (code 32 only, never tabs).
+std::string_view TrimView(std::string_view text);
+std::string Trim(std::string_view text);
+
+// ASCII upper case; bytes >= 0x80 pass unchanged.
+std::string Upper(std::string_view text);
+
+// Assignment to a fixed-width field: left-aligned, padded with spaces, cut to
+// the width.
+std::string FixedWidth(std::string_view text, std::size_t width);
+
+// RString / LString: when text is shorter than width, the trimmed text padded
+// to exactly width (spaces in front / behind); otherwise text unchanged.
+std::string RString(std::string_view text, int width);
+std::string LString(std::string_view text, int width);
+
+// KTraCCG: trims text in place; 1 when the trimmed text holds a character
+// other than the digits and ".", otherwise 0.
+int KTraCCG(std::string& text);
+
+// A fixed-width text field of the computation state (names 12, X 11, Y 10...).
+template <std::size_t N>
+class FixedText {
+ public:
+  FixedText() : value_(N, ' ') {}
+  FixedText& operator=(std::string_view text) {
+    value_ = FixedWidth(text, N);
+    return *this;
+  }
+  const std::string& str() const { return value_; }
+  operator const std::string&() const { return value_; }
+  bool operator==(const FixedText& other) const = default;
+
+ private:
+  std::string value_;
+};
+
+// tachdong: every tab turned into a space, runs of spaces reduced to one; the
+// normalised text written back into line; the fields returned. The caller has
+// already removed the surrounding spaces.
+std::vector<std::string> SplitFields(std::string& line);
+
+}  // namespace kavu

@@ -1,0 +1,186 @@
+#include "import/dispatch.h"
+
+#include <array>
+#include <filesystem>
+#include <system_error>
+
+#include "core/messages.h"
+#include "core/text.h"
+#include "import/converters.h"
+
+namespace kavu {
+namespace fs = std::filesystem;
+
+namespace {
+
+struct Kind {
+  std::string_view extension;
+  std::string_view pattern;
+};
+
+constexpr std::array<Kind, 10> kKinds{{
+    {"ASC", "*.asc"},
+    {"SDR", "*.sdr"},
+    {"OBS", "*.obs"},
+    {"SET", "*.set"},
+    {"RAW", "*.raw"},
+    {"IDX", "*.idx"},
+    {"TCM", "*.tcm"},
+    {"GRE", "*.gre"},
+    {"DN7", "*.dn7"},
+    {"", "*.*"},
+}};
+
+// Widths of the header texts in the field sketch.
+constexpr std::array<std::size_t, 7> kHeaderWidths{39, 6, 19, 20, 17, 18, 10};
+
+std::string WithSeparator(const fs::path& folder) {
+  std::string text = folder.string();
+  if (text.empty() || text.back() != fs::path::preferred_separator) {
+    text += static_cast<char>(fs::path::preferred_separator);
+  }
+  return text;
+}
+
+void RefuseFile(RunState& st, Host& host, std::string_view message) {
+  host.MessageBox(message, MsgIcon::Critical, MsgButtons::Ok);
+  st.txtfile.clear();
+  host.SetFileBox("");
+  host.FocusFileBox();
+}
+
+std::string NotFoundMessage(const std::string& path) {
+  return std::string(msg::kFileNotFound) + path + "\r" + std::string(msg::kEnterNewFile);
+}
+
+// The converted field book; nothing for kinds without a converter.
+std::optional<std::string> Convert(int kind, std::string_view content) {
+  switch (kind) {
+    case 1:
+    case 7:
+      return ConvertSdr(content, kind);
+    case 2:
+      return ConvertObs(content, kind);
+    case 3:
+      return ConvertSet(content);
+    case 5:
+      return ConvertIdx(content);
+    case 6:
+      return ConvertTcm(content);
+    default:
+      return std::nullopt;
+  }
+}
+
+}  // namespace
+
+int KindOfExtension(std::string_view upperExtension) {
+  for (std::size_t k = 0; k + 1 < kKinds.size(); ++k) {
+    if (kKinds[k].extension == upperExtension) return static_cast<int>(k);
+  }
+  return 9;
+}
+
+std::string_view PatternOfKind(int kind) {
+  if (kind < 0 || kind > 9) return "*.*";
+  return kKinds[static_cast<std::size_t>(kind)].pattern;
+}
+
+void DeriveFileSelection(FileSelection& sel, std::string_view path) {
+  sel.filesl = std::string(path);
+  const fs::path file(sel.filesl);
+  const std::string name = file.filename().string();
+  const std::string folderText = sel.filesl.substr(0, sel.filesl.size() - name.size());
+  sel.tentm = folderText;
+  // Only the dots of the file name count: a dot in a folder name must not
+  // rename the products.
+  const std::size_t firstDot = name.find('.');
+  if (firstDot == std::string::npos) {
+    sel.daufile = sel.filesl;
+    sel.duoifile.clear();
+  } else {
+    sel.daufile = folderText + name.substr(0, firstDot);
+    const std::size_t secondDot = name.find('.', firstDot + 1);
+    sel.duoifile = name.substr(firstDot + 1, secondDot == std::string::npos
+                                                 ? std::string::npos
+                                                 : secondDot - firstDot - 1);
+  }
+  // The regenerated field book goes to TRIDO beside the file's folder.
+  std::error_code ec;
+  fs::path folder = fs::absolute(file, ec).parent_path();
+  fs::path parent = folder.parent_path();
+  if (parent.empty() || parent == folder) parent = folder;
+  sel.tentmbd = WithSeparator(parent / "TRIDO");
+  sel.filesl1 = sel.tentmbd + name.substr(0, firstDot) + ".asc";
+}
+
+std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host) {
+  // The chosen file.
+  if (st.txtfile.empty()) {
+    st.filesl.clear();
+    host.MessageBox(msg::kNoFileChosen, MsgIcon::Critical, MsgButtons::Ok);
+    return std::nullopt;
+  }
+  std::error_code ec;
+  if (!fs::is_regular_file(st.txtfile, ec)) {
+    RefuseFile(st, host, NotFoundMessage(st.txtfile));
+    return std::nullopt;
+  }
+  DeriveFileSelection(st, st.txtfile);
+  const int kind =
+      st.kindOverride >= 0 && st.kindOverride <= 9 ? st.kindOverride : KindOfExtension(Upper(st.duoifile));
+  st.cbkieu = kind;
+  host.ShowFolder(st.tentm, PatternOfKind(kind));
+  host.SelectKind(kind);
+  if (Ticked(st.fsdo)) {
+    for (std::size_t i = 0; i < kHeaderWidths.size(); ++i) {
+      st.nhap[i] = FixedWidth(st.nhapsdo[i], kHeaderWidths[i]);
+    }
+  }
+  if (fs::file_size(st.filesl, ec) == 0 && !ec) {
+    RefuseFile(st, host,
+               std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
+    return std::nullopt;
+  }
+
+  // The field book to compute: the chosen file itself, a converted one, or
+  // the one of the same base name for kinds without a converter.
+  std::optional<std::string> content;
+  const std::string fieldBook = kind == 0 ? st.filesl : st.daufile + ".asc";
+  if (kind == 0) {
+    content = ReadFileBytes(st.filesl);
+  } else {
+    const auto raw = ReadFileBytes(st.filesl);
+    if (!raw) {
+      host.MessageBox(std::string(msg::kCannotOpen) + st.filesl, MsgIcon::Critical, MsgButtons::Ok);
+      return std::nullopt;
+    }
+    content = Convert(kind, *raw);
+    if (content) {
+      TextOut out(fieldBook);
+      out.Write(*content);
+      if (!out.close()) st.unwritable.push_back(fieldBook);
+    } else {
+      if (!fs::is_regular_file(fieldBook, ec)) {
+        RefuseFile(st, host, NotFoundMessage(fieldBook));
+        return std::nullopt;
+      }
+      content = ReadFileBytes(fieldBook);
+    }
+  }
+  if (!content) {
+    host.MessageBox(std::string(msg::kCannotOpen) + fieldBook, MsgIcon::Critical, MsgButtons::Ok);
+    return std::nullopt;
+  }
+
+  // The run and the window switch to the field book.
+  st.filesl = fieldBook;
+  st.txtfile = fieldBook;
+  host.SetFileBox(fieldBook);
+  st.cbkieu = 0;
+  host.ShowFolder(st.tentm, PatternOfKind(0));
+  host.SelectKind(0);
+  return SplitLines(*content);
+}
+
+}  // namespace kavu

@@ -1,0 +1,31 @@
+// Input check and conversion dispatch: the first stage of every run.
+#pragma once
+
+#include <optional>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "core/host.h"
+#include "core/state.h"
+
+namespace kavu {
+
+// Index in the kind list of an upper-case extension ("SDR" -> 1); 9 for any
+// other.
+int KindOfExtension(std::string_view upperExtension);
+// The file pattern of a kind ("*.sdr"); "*.*" outside 0 to 9.
+std::string_view PatternOfKind(int kind);
+
+// Sets filesl, tentm, daufile, duoifile, tentmbd and filesl1 from a path.
+// daufile and duoifile use the first and second "." of the file name.
+void DeriveFileSelection(FileSelection& sel, std::string_view path);
+
+// KTraFileSoLieu and the dispatch: checks the chosen file, derives the names,
+// selects the kind from the extension (unless kindOverride), copies the header
+// texts when the field sketch is wanted, converts an instrument file, and
+// switches the run to the field book. False when the run must end.
+// Returns the field book's lines, or nothing when the run must end.
+std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host);
+
+}  // namespace kavu

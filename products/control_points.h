@@ -1,0 +1,17 @@
+// Control points and the working copy of the field book.
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "core/host.h"
+#include "core/state.h"
+
+namespace kavu {
+
+// DocFileKhongChe: fills MangKhongChe from the field book or from the common
+// control-point file and the working copy tamsl from the rest of the field
+// book. False when the run must end (message box shown).
+bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& fieldBook);
+
+}  // namespace kavu

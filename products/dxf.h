@@ -1,0 +1,12 @@
+// The drawing exchange file (.dxf): control and detail points with their
+// names, for a CAD program.
+#pragma once
+
+#include "core/state.h"
+
+namespace kavu {
+
+// Writes daufile + ".dxf"; false when the file could not be written.
+bool indxf(RunState& st);
+
+}  // namespace kavu

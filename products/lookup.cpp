@@ -1,0 +1,82 @@
+#include "products/lookup.h"
+
+#include <cmath>
+
+#include "core/messages.h"
+#include "core/numbers.h"
+#include "core/text.h"
+
+namespace kavu {
+
+std::string ControlLine(const std::string& name12, const std::string& x11,
+                        const std::string& y10, const std::string* z10) {
+  std::string line = "TR " + name12;
+  // A name that fills its columns would run into X and read back wrongly.
+  if (!name12.empty() && name12.back() != ' ') line += ' ';
+  line += x11 + " " + y10;
+  if (z10 != nullptr) line += " " + *z10;
+  return line;
+}
+
+namespace {
+
+void AppendControlLine(RunState& st) {
+  st.ChuoiKC += ControlLine(st.TenKC, st.StX, st.StY, Ticked(st.fdc) ? &st.StZ.str() : nullptr);
+  st.ChuoiKC += "\r\n";
+}
+
+void TakeCoordinates(RunState& st) {
+  st.X = RoundEven(Val(st.StX.str()), 3);
+  st.Y = RoundEven(Val(st.StY.str()), 3);
+  st.Z = RoundEven(Val(st.StZ.str()), 3);
+}
+
+}  // namespace
+
+void TimToaDoDiem(RunState& st) {
+  st.n = 0;
+  int first = 0;
+  st.TenKC = Trim(st.TenKC.str());
+  const std::string wanted = Trim(st.TenKC.str());
+  for (int k = 0; k < st.sdkc(); ++k) {
+    const KnownPoint& point = st.MangKhongChe[static_cast<std::size_t>(k)];
+    if (Trim(point[0]) != wanted) continue;
+    ++st.n;
+    st.StX = point[1];
+    st.StY = point[2];
+    st.StZ = point[3];
+    if (st.ChuoiKC.find(st.TenKC.str()) == std::string::npos) AppendControlLine(st);
+    if (st.n > 1) {
+      const double x = RoundEven(Val(st.StX.str()), 3);
+      const double y = RoundEven(Val(st.StY.str()), 3);
+      if (std::fabs(st.X - x) > st.dscdh || std::fabs(st.Y - y) > st.dscdh) {
+        ReportError(st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kAtLine) +
+                            ReportNumber(first) + std::string(msg::kAnd) + ReportNumber(k + 1) +
+                            std::string(msg::kDifferentCoordinates) + std::string(msg::kDX) +
+                            ReportNumber(RoundEven(st.X - x, 2)) + std::string(msg::kDY) +
+                            ReportNumber(RoundEven(st.Y - y, 2)));
+      }
+    } else {
+      TakeCoordinates(st);
+      first = k + 1;
+    }
+  }
+  // A point computed earlier in the run, named "DKC" + its name.
+  for (int k = 0; k < st.sdtd(); ++k) {
+    const DetailPoint& point = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
+    if ("DKC" + Trim(point[0]) != wanted) continue;
+    ++st.n;
+    st.StX = point[1];
+    st.StY = point[2];
+    st.StZ = point[3];
+    if (st.n == 1) TakeCoordinates(st);
+    st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
+    AppendControlLine(st);
+  }
+  if (st.n == 0) {
+    st.I = 0;
+    ReportError(st, std::string(msg::kPointColon) + st.TenKC.str() + std::string(msg::kNoCoordinates));
+  }
+}
+
+}  // namespace kavu

@@ -1,0 +1,9 @@
+#include "products/pegs.h"
+
+namespace kavu {
+
+void WritePegFileHead(RunState&) {}
+
+void incocphu(RunState&) {}
+
+}  // namespace kavu

@@ -1,0 +1,7 @@
+#include "products/sketch.h"
+
+namespace kavu {
+
+void insodo(RunState&) {}
+
+}  // namespace kavu

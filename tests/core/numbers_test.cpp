@@ -1,0 +1,109 @@
+#include "core/numbers.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <limits>
+
+#include "core/random.h"
+
+namespace kavu {
+namespace {
+
+TEST(Val, ReadsTheNumericPrefixSkippingBlanks) {
+  EXPECT_EQ(Val(" -1 2.5e1x"), -125);  // blanks inside the number ignored
+  EXPECT_EQ(Val("\t 3\n4"), 34);
+  EXPECT_EQ(Val("+7"), 7);
+  EXPECT_EQ(Val("-.5"), -0.5);
+  EXPECT_EQ(Val("1.2.3"), 1.2);  // a second point ends the number
+  EXPECT_EQ(Val("1D2"), 100);
+  EXPECT_EQ(Val("1 e -2"), 0.01);
+  EXPECT_EQ(Val("1e"), 1);  // an exponent without digits is not read
+  EXPECT_EQ(Val("12,5"), 12);
+  EXPECT_EQ(Val("abc"), 0);
+  EXPECT_EQ(Val(""), 0);
+  EXPECT_EQ(Val("1e400"), 0);  // beyond double range
+  EXPECT_EQ(Val(std::string(400, '9')), 0);
+}
+
+TEST(Val, HasNumberNeedsAMantissaDigit) {
+  EXPECT_TRUE(HasNumber(" -0"));
+  EXPECT_TRUE(HasNumber("5x"));
+  EXPECT_FALSE(HasNumber("."));
+  EXPECT_FALSE(HasNumber("-e5"));
+  EXPECT_FALSE(HasNumber("x5"));
+}
+
+TEST(Rounding, TiesGoToEven) {
+  EXPECT_EQ(RoundEven(2.5, 0), 2);
+  EXPECT_EQ(RoundEven(3.5, 0), 4);
+  EXPECT_EQ(RoundEven(-2.5, 0), -2);
+  EXPECT_EQ(RoundEven(0.125, 2), 0.12);  // 12.5 exactly
+  EXPECT_EQ(RoundEven(0.375, 2), 0.38);
+  EXPECT_EQ(RoundEven(1.26, 1), 1.3);
+  EXPECT_EQ(RoundEven(1e300, 2), 1e300);  // beyond 2^52 left unchanged
+  EXPECT_EQ(RoundEvenWhole(-0.5), 0);
+  EXPECT_EQ(RoundEvenWhole(-1.5), -2);
+  EXPECT_EQ(Fix(-1.7), -1);
+  EXPECT_EQ(Fix(1.7), 1);
+}
+
+TEST(Mask, HalvesAwayFromZeroAndOptionalDigits) {
+  EXPECT_EQ(Mask(0.5, "####.000"), ".500");
+  EXPECT_EQ(Mask(-0.0004, "####.000"), ".000");  // a zero result has no minus
+  EXPECT_EQ(Mask(2.5, "##0"), "3");
+  EXPECT_EQ(Mask(-2.5, "##0"), "-3");
+  EXPECT_EQ(Mask(0, "##0"), "0");
+  EXPECT_EQ(Mask(5, "00"), "05");
+  EXPECT_EQ(Mask(123, "00"), "123");  // more digits than the mask: all written
+  EXPECT_EQ(Mask(450, "0000000"), "0000450");
+  EXPECT_EQ(Mask(0, "#######"), "");
+  EXPECT_EQ(Mask(1234.5678, "####0.000"), "1234.568");
+  EXPECT_EQ(Mask(0.0005, "####0.000"), "0.001");
+  EXPECT_EQ(Mask(-12.3456, "#######.000"), "-12.346");
+  EXPECT_EQ(Mask(123456789, "####.000"), "123456789.000");
+  EXPECT_EQ(Mask(std::numeric_limits<double>::quiet_NaN(), "##0"), "0");
+  EXPECT_EQ(Mask(std::numeric_limits<double>::infinity(), "####.000"), ".000");
+}
+
+TEST(NumberText, FifteenDigitsAndNoLeadingZero) {
+  EXPECT_EQ(NumberText(3), "3");
+  EXPECT_EQ(NumberText(0), "0");
+  EXPECT_EQ(NumberText(-0.0), "0");
+  EXPECT_EQ(NumberText(0.05), ".05");
+  EXPECT_EQ(NumberText(-0.12), "-.12");
+  EXPECT_EQ(NumberText(0.1 + 0.2), ".3");
+  EXPECT_EQ(NumberText(0.0001), ".0001");
+  EXPECT_EQ(NumberText(1e-5), "1E-05");
+  EXPECT_EQ(NumberText(1e14), "100000000000000");
+  EXPECT_EQ(NumberText(1e15), "1E+15");
+  EXPECT_EQ(NumberText(1.5e20), "1.5E+20");
+  EXPECT_EQ(NumberText(123456789012345678.0), "1.23456789012346E+17");
+  EXPECT_EQ(NumberText(-2345678.125), "-2345678.125");
+}
+
+TEST(NumberText, ReportAndCountForms) {
+  EXPECT_EQ(ReportNumber(3), " 3 ");
+  EXPECT_EQ(ReportNumber(-0.12), "-.12 ");
+  EXPECT_EQ(ReportNumber(0), " 0 ");
+  EXPECT_EQ(ReportNumber(-0.0), " 0 ");
+  EXPECT_EQ(SignedCount(12), " 12");
+  EXPECT_EQ(SignedCount(0), " 0");
+  EXPECT_EQ(SignedCount(-3), "-3");
+}
+
+TEST(SplitMix64, MatchesTheReferenceSequence) {
+  // First output of SplitMix64 seeded with 0 is 0xE220A8397B1DCDAF.
+  SplitMix64 rng(0);
+  EXPECT_EQ(rng.Next(), static_cast<double>(0xE220A8397B1DCDAFULL >> 11) * 0x1.0p-53);
+  SplitMix64 a(42), b(42);
+  for (int i = 0; i < 1000; ++i) {
+    const double x = a.Next();
+    ASSERT_EQ(x, b.Next());
+    ASSERT_GE(x, 0.0);
+    ASSERT_LT(x, 1.0);
+  }
+}
+
+}  // namespace
+}  // namespace kavu

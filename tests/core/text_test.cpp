@@ -1,0 +1,115 @@
+#include "core/text.h"
+
+#include <gtest/gtest.h>
+
+#include <cmath>
+#include <filesystem>
+
+#include "core/angles.h"
+#include "core/lines.h"
+
+namespace kavu {
+namespace {
+
+TEST(Text, TrimTouchesOnlySpaces) {
+  EXPECT_EQ(Trim("  \ta b\t  "), "\ta b\t");
+  EXPECT_EQ(Trim("   "), "");
+  EXPECT_EQ(Upper("kt\xB5z"), "KT\xB5Z");
+  EXPECT_EQ(FixedWidth("abc", 5), "abc  ");
+  EXPECT_EQ(FixedWidth("abcdefg", 5), "abcde");
+  FixedText<12> name;
+  EXPECT_EQ(name.str(), std::string(12, ' '));
+  name = "DC05";
+  EXPECT_EQ(name.str(), "DC05        ");
+}
+
+TEST(Text, AlignDecidesOnUntrimmedLengthAndNeverCuts) {
+  EXPECT_EQ(RString("ab", 5), "   ab");
+  EXPECT_EQ(LString("ab", 5), "ab   ");
+  EXPECT_EQ(RString(" ab ", 5), "   ab");
+  EXPECT_EQ(LString(" ab ", 5), "ab   ");
+  EXPECT_EQ(RString("  ab", 4), "  ab");
+  EXPECT_EQ(RString("abcdef", 4), "abcdef");
+  EXPECT_EQ(RString("ab", -1), "ab");
+}
+
+TEST(Text, KTraCCGTrimsAndFlagsOtherCharacters) {
+  std::string s = " 1.55 ";
+  EXPECT_EQ(KTraCCG(s), 0);
+  EXPECT_EQ(s, "1.55");
+  for (std::string t : {"1,55", "-1", "M12", "1 2"}) EXPECT_EQ(KTraCCG(t), 1) << t;
+  std::string empty;
+  EXPECT_EQ(KTraCCG(empty), 0);
+}
+
+TEST(Text, SplitFieldsNormalisesTheLine) {
+  std::string line = "P7\t\t1234530   45.210 \t0901500 1.50";
+  const auto fields = SplitFields(line);
+  EXPECT_EQ(line, "P7 1234530 45.210 0901500 1.50");
+  ASSERT_EQ(fields.size(), 5u);
+  EXPECT_EQ(fields[2], "45.210");
+  std::string tab_first = "\tK1 0";  // only spaces are trimmed before the tabs turn into spaces
+  EXPECT_EQ(SplitFields(tab_first), (std::vector<std::string>{"", "K1", "0"}));
+  std::string empty;
+  EXPECT_TRUE(SplitFields(empty).empty());
+}
+
+TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
+  AngleParts parts;
+  EXPECT_EQ(GocStringText(123.7584722, &parts), " 123 45 30");
+  EXPECT_EQ(parts.do1, 123);
+  EXPECT_EQ(parts.phut, 45);
+  EXPECT_EQ(parts.giay, 30);
+  EXPECT_EQ(GocStringText(5.0691666667), "   5 04 09");
+  EXPECT_EQ(GocStringText(-12.5), " -12 30 00");
+  EXPECT_EQ(GocStringText(359.99999), "   0 00 00");  // carry wraps 360 to 0
+  EXPECT_EQ(GocStringText(1000), " 640 00 00");       // 360 taken off once only
+  EXPECT_EQ(GocStringText(-0.00001), "  -0 00 00");
+  EXPECT_EQ(GocSt(123.7584722), "  1234530");
+  EXPECT_EQ(GocSt(-12.5), "  -123000");
+  EXPECT_EQ(GocSt(5.0691666667), "    50409");
+  EXPECT_EQ(GocSt1(5.0691666667), "  5 04 09");
+  EXPECT_EQ(GocSt1(-123.7584722), "-123 45 30");  // 10 characters, not cut
+}
+
+TEST(Angles, CvGocDblReadsPackedColumns) {
+  EXPECT_NEAR(CvGocDbl("1234530"), 123 + 45 / 60.0 + 30 / 3600.0, 1e-12);
+  EXPECT_NEAR(CvGocDbl("450"), 4 / 60.0 + 50 / 3600.0, 1e-12);  // read as 0000450
+  EXPECT_EQ(CvGocDbl(""), 0);
+  EXPECT_TRUE(std::isfinite(CvGocDbl("-99999999999")));
+}
+
+TEST(Lines, EveryLineEndCounts) {
+  using V = std::vector<std::string>;
+  EXPECT_EQ(SplitLines("a\r\nb\rc\nd"), (V{"a", "b", "c", "d"}));
+  EXPECT_EQ(SplitLines("a\r\n"), (V{"a"}));
+  EXPECT_EQ(SplitLines("a\n\nb\n"), (V{"a", "", "b"}));
+  EXPECT_EQ(SplitLines("a\r\r\n"), (V{"a", ""}));
+  EXPECT_EQ(SplitLines("\r\n"), (V{""}));
+  EXPECT_TRUE(SplitLines("").empty());
+}
+
+TEST(Lines, TextOutWritesCrLfAndReportsFailure) {
+  const auto dir = std::filesystem::temp_directory_path() / "kavu_lines_test";
+  std::filesystem::create_directories(dir);
+  {
+    TextOut out(dir / "a.txt");
+    EXPECT_TRUE(out.ok());
+    out.Line("x");
+    out.Write("y");
+    EXPECT_TRUE(out.close());
+  }
+  EXPECT_EQ(ReadFileBytes(dir / "a.txt"), std::optional<std::string>("x\r\ny"));
+  EXPECT_EQ(ReadLines(dir / "a.txt"), (std::optional<std::vector<std::string>>({"x", "y"})));
+  EXPECT_FALSE(ReadFileBytes(dir / "missing.txt"));
+  EXPECT_FALSE(ReadFileBytes(dir));
+
+  TextOut bad(dir / "no" / "such" / "b.txt");
+  EXPECT_FALSE(bad.ok());
+  bad.Line("swallowed");
+  EXPECT_FALSE(bad.close());
+  std::filesystem::remove_all(dir);
+}
+
+}  // namespace
+}  // namespace kavu
