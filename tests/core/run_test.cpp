@@ -1,0 +1,214 @@
+#include "core/run.h"
+
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+
+#include "core/messages.h"
+#include "support.h"
+
+namespace kavu {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::FileBytes;
+using testing::FreshFolder;
+using testing::RecordingHost;
+using testing::WriteBytes;
+
+const fs::path kEveryRecord = fs::path(KAVU_TEST_DATA) / "run" / "every-record";
+
+RunState StateFor(const fs::path& file) {
+  RunState st;
+  st.txtfile = file.string();
+  st.seed = 7;
+  return st;
+}
+
+// The field book holds every record kind and every report line: duplicate
+// control points within (KC1) and beyond (KC3) the tolerance, a 12-character
+// name, a line where a station was expected, tabs and runs of spaces, pegs
+// (CP1 later occupied as a station), orientation-distance and check records,
+// malformed, ignored and non-numeric lines, entry errors, a "DKC" reference,
+// a skipped block, a station record without instrument height, a station with
+// only a check record and an orientation record on the last line. Every
+// expected file was checked line by line against the layouts, the coordinates
+// against an independent single-precision azimuth computation.
+TEST(Run, EveryRecordKindGivesTheHandCheckedProducts) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "data");
+  fs::copy_file(kEveryRecord / "job.asc", folder / "data" / "job.asc");
+  RunState st = StateFor(folder / "data" / "job.asc");
+  st.fasc = st.ftd = st.fkc = 1;
+  RecordingHost host;
+  const RunResult result = tinh_Click(st, host);
+
+  EXPECT_EQ(result.outcome, RunOutcome::Completed);
+  EXPECT_EQ(result.stations, 6);
+  EXPECT_EQ(result.bodyRecords, 22);
+  EXPECT_EQ(result.err, 15);
+  EXPECT_TRUE(result.unwritable.empty());
+  for (const char* name : {"job.err", "job.cpv", "job.kc", "job.td1", "job.txt"}) {
+    EXPECT_EQ(FileBytes(folder / "data" / name), FileBytes(kEveryRecord / "expected" / name))
+        << name;
+  }
+  EXPECT_EQ(FileBytes(folder / "TRIDO" / "job.asc"),
+            FileBytes(kEveryRecord / "expected" / "TRIDO-job.asc"));
+  // The products are those asked for, and nothing else.
+  EXPECT_FALSE(fs::exists(folder / "data" / "job.dxf"));
+  EXPECT_FALSE(fs::exists(folder / "data" / "job.sdo"));
+  // The window shows the summary, then the program's title, and beeps.
+  ASSERT_FALSE(host.messages.empty());
+  EXPECT_NE(host.messages.back().find("Tổng số lỗi:  15\r"), std::string::npos);
+  EXPECT_EQ(host.titles.back(), msg::kProgramTitle);
+  EXPECT_EQ(host.beeps, 1);
+  EXPECT_EQ(host.kind, 0);
+}
+
+// The regenerated field book is itself a field book: computing it again
+// gives the same coordinates.
+TEST(Run, RegeneratedFieldBookComputesToTheSameCoordinates) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "a");
+  fs::copy_file(kEveryRecord / "job.asc", folder / "a" / "job.asc");
+  RunState first = StateFor(folder / "a" / "job.asc");
+  first.fasc = first.ftd = 1;
+  RecordingHost host;
+  tinh_Click(first, host);
+
+  fs::create_directories(folder / "b");
+  fs::copy_file(folder / "TRIDO" / "job.asc", folder / "b" / "job.asc");
+  RunState second = StateFor(folder / "b" / "job.asc");
+  second.ftd = 1;
+  tinh_Click(second, host);
+  // The skipped stations and rejected lines are gone, so only the computed
+  // points are compared.
+  EXPECT_EQ(FileBytes(folder / "b" / "job.txt"), FileBytes(folder / "a" / "job.txt"));
+}
+
+TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
+  const fs::path folder = FreshFolder();
+  WriteBytes(folder / "job.asc",
+             "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
+  WriteBytes(folder / "job.bak", "old\r\n");
+  RunState st = StateFor(folder / "job.asc");
+  RecordingHost host;
+  const RunResult result = tinh_Click(st, host);
+  EXPECT_EQ(result.outcome, RunOutcome::Completed);
+  EXPECT_EQ(result.err, 0);
+  for (const char* name : {"job.err", "job.cpv", "job.bak"}) {
+    EXPECT_FALSE(fs::exists(folder / name)) << name;
+  }
+  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
+}
+
+TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
+  const fs::path folder = FreshFolder();
+  RecordingHost host;
+
+  RunState none;
+  EXPECT_EQ(tinh_Click(none, host).outcome, RunOutcome::NotStarted);
+  EXPECT_EQ(host.messages.back(), msg::kNoFileChosen);
+
+  RunState missing = StateFor(folder / "nothing.asc");
+  host.fileBox = "x";
+  EXPECT_EQ(tinh_Click(missing, host).outcome, RunOutcome::NotStarted);
+  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) + (folder / "nothing.asc").string() +
+                                      "\r" + std::string(msg::kEnterNewFile));
+  EXPECT_EQ(host.fileBox, "");
+  EXPECT_EQ(missing.txtfile, "");
+
+  WriteBytes(folder / "empty.asc", "");
+  RunState empty = StateFor(folder / "empty.asc");
+  EXPECT_EQ(tinh_Click(empty, host).outcome, RunOutcome::NotStarted);
+  EXPECT_EQ(host.messages.back(),
+            std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
+
+  // A kind without converter needs the field book of the same base name.
+  WriteBytes(folder / "job.raw", "raw data\r\n");
+  RunState raw = StateFor(folder / "job.raw");
+  EXPECT_EQ(tinh_Click(raw, host).outcome, RunOutcome::NotStarted);
+  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) + (folder / "job.asc").string() +
+                                      "\r" + std::string(msg::kEnterNewFile));
+  EXPECT_FALSE(fs::exists(folder / "job.err"));
+
+  // Only control points: the reports are left with their headers.
+  WriteBytes(folder / "kc.asc", "TR A 1 2 3\r\n\r\n   \r\n");
+  RunState onlyControl = StateFor(folder / "kc.asc");
+  EXPECT_EQ(tinh_Click(onlyControl, host).outcome, RunOutcome::StoppedEarly);
+  EXPECT_EQ(host.messages.back(), msg::kNoDetailData);
+  EXPECT_EQ(FileBytes(folder / "kc.err"),
+            std::string(msg::kErrHeader1) + "\r\n" + std::string(msg::kErrHeader2) + "\r\n");
+}
+
+TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
+  const fs::path folder = FreshFolder();
+  WriteBytes(folder / "job.asc",
+             "TR A 5 5 5\r\nTR B 6 6 6\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
+  WriteBytes(folder / "common.kc", "header line\r\nTR A 1000 1000 10\r\nTR B 900 1000\r\n");
+  RecordingHost host;
+
+  RunState st = StateFor(folder / "job.asc");
+  st.ckKC = 1;
+  st.txtFKC = "  " + (folder / "common.kc").string() + " ";
+  EXPECT_EQ(tinh_Click(st, host).outcome, RunOutcome::Completed);
+  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
+
+  RunState unnamed = StateFor(folder / "job.asc");
+  unnamed.ckKC = 1;
+  unnamed.txtFKC = "   ";
+  EXPECT_EQ(tinh_Click(unnamed, host).outcome, RunOutcome::StoppedEarly);
+  EXPECT_EQ(host.messages.back(), msg::kNoControlFile);
+
+  RunState unreadable = StateFor(folder / "job.asc");
+  unreadable.ckKC = 1;
+  unreadable.txtFKC = (folder / "gone.kc").string();
+  EXPECT_EQ(tinh_Click(unreadable, host).outcome, RunOutcome::StoppedEarly);
+  EXPECT_EQ(host.messages.back(), std::string(msg::kCannotOpen) + (folder / "gone.kc").string());
+}
+
+TEST(Run, UnwritableProductIsNamedAndTheOthersAreWritten) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "data");
+  WriteBytes(folder / "data" / "job.asc",
+             "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
+  WriteBytes(folder / "TRIDO", "a file where the folder should be");
+  RunState st = StateFor(folder / "data" / "job.asc");
+  st.fasc = st.ftd = 1;
+  RecordingHost host;
+  const RunResult result = tinh_Click(st, host);
+  ASSERT_EQ(result.unwritable.size(), 1u);
+  EXPECT_EQ(result.unwritable[0], st.filesl1);
+  EXPECT_TRUE(fs::exists(folder / "data" / "job.td1"));
+  EXPECT_TRUE(fs::exists(folder / "data" / "job.txt"));
+  EXPECT_NE(host.messages.back().find(std::string(msg::kCannotWrite) + st.filesl1 + "\r"),
+            std::string::npos);
+}
+
+// Whatever the bytes, the run ends with its summary.
+TEST(Run, HostileBytesEndWithASummary) {
+  const fs::path folder = FreshFolder();
+  const std::string head = "TR A 1000 1000 10\nTR B 900 1000 12\rTR A 1.5\r\nDKD B\n";
+  std::string binary;
+  for (int i = 0; i < 4096; ++i) binary += static_cast<char>((i * 131 + 7) % 256);
+  const std::string cases[] = {
+      head + "1 900000 100 900000 1.5",                                // no final line end
+      head + std::string("1 9\0 100 900000 1.5\r\n", 21),              // NUL inside a number
+      head + "2 0 1 90 1 " + std::string(10'000'000, 'x') + "\r\n",    // a 10 MB word
+      head + binary,                                                   // binary data
+      head + "\xa7\x81\xff 0 1 900000 1 \x80\r\n1e999 1e999 1e999 1e999 1e999\r\n",
+      head + "TR 1e308 1e308 1e308 1e308\r\nTR 1e308 1.5\r\nDKD B\r\n3 1e300 1e300 1e300 1\r\n",
+  };
+  RecordingHost host;
+  for (const std::string& bytes : cases) {
+    WriteBytes(folder / "job.asc", bytes);
+    RunState st = StateFor(folder / "job.asc");
+    st.fasc = st.ftd = st.fkc = 1;
+    const RunResult result = tinh_Click(st, host);
+    EXPECT_EQ(result.outcome, RunOutcome::Completed) << bytes.substr(0, 80);
+  }
+}
+
+}  // namespace
+}  // namespace kavu
