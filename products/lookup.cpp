@@ -38,9 +38,10 @@ void TimToaDoDiem(RunState& st) {
   int first = 0;
   st.TenKC = Trim(st.TenKC.str());
   const std::string wanted = Trim(st.TenKC.str());
+  const std::string_view name = wanted;
   for (int k = 0; k < st.sdkc(); ++k) {
     const KnownPoint& point = st.MangKhongChe[static_cast<std::size_t>(k)];
-    if (Trim(point[0]) != wanted) continue;
+    if (TrimView(point[0]) != name) continue;
     ++st.n;
     st.StX = point[1];
     st.StY = point[2];
@@ -62,9 +63,11 @@ void TimToaDoDiem(RunState& st) {
     }
   }
   // A point computed earlier in the run, named "DKC" + its name.
-  for (int k = 0; k < st.sdtd(); ++k) {
+  const bool computedPoint = name.starts_with("DKC");
+  const std::string_view computedName = computedPoint ? name.substr(3) : std::string_view();
+  for (int k = 0; computedPoint && k < st.sdtd(); ++k) {
     const DetailPoint& point = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
-    if ("DKC" + Trim(point[0]) != wanted) continue;
+    if (TrimView(point[0]) != computedName) continue;
     ++st.n;
     st.StX = point[1];
     st.StY = point[2];
