@@ -1,0 +1,50 @@
+// Pieces shared by the converters of fixed-column instrument files: column
+// access that never reads past a line, the record code, the reduction of a
+// slope distance, readings turned to the backsight, and the column texts of a
+// detail record.
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+namespace kavu {
+
+// Characters `from` to `to` of a line (counted from 1, both included); the
+// part past the end of the line is simply missing, so a short line gives a
+// short or empty field.
+std::string_view Columns(std::string_view line, std::size_t from, std::size_t to);
+
+// Characters `from` to the end of the line.
+std::string_view ColumnsFrom(std::string_view line, std::size_t from);
+
+// The record code: characters 1 to 4, or "AAAA" (which matches no code) for
+// a line that holds nothing but spaces.
+std::string_view RecordCode(std::string_view line);
+
+// Horizontal distance from a slope distance and a zenith angle in decimal
+// degrees, rounded to millimetres with ties to even. The recorders' divisor
+// is 180.0000001, not 180.
+double HorizontalDistance(double slope, double zenith_degrees);
+
+// A horizontal reading turned so that the backsight reads zero: nothing
+// happens while no backsight reading is known (0); a negative difference gets
+// 360 added once.
+double TurnReading(double reading, double backsight_reading);
+
+// A computed horizontal distance in its 9 columns ("####0.000").
+std::string DistanceText(double distance);
+
+// A prism height in its 7 columns. A text of 7 characters or more (recorders
+// write "1.47400000") gets one space in front, so it never runs into the
+// zenith angle before it.
+std::string PrismHeightText(std::string_view height);
+
+// The point number of an identifier: the ordinary number text of its value
+// (0012 -> 12, A7 -> 0, 0.5 -> .5).
+std::string PointNumberText(std::string_view identifier);
+
+// Appends a field-book line with its CR LF.
+void AppendLine(std::string& out, std::string_view line);
+
+}  // namespace kavu

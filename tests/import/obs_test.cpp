@@ -1,0 +1,62 @@
+#include <gtest/gtest.h>
+
+#include <string>
+
+#include "import/converters.h"
+#include "tests/import/instrument_test_util.h"
+
+namespace kavu {
+namespace {
+
+using testing::CountStarting;
+using testing::RealData;
+using testing::TestData;
+
+// codes.obs: keyed-in points (X with 7 digits keeps 3 decimals, Y with 7
+// keeps 2, a nameless one is dropped), an 08CO that writes nothing, a point
+// before its backsight (turned once the backsight is read), a backsight name
+// longer than its 10-character column, targets 0012 and P7 that are not plain
+// numbers, a blank distance, and a set-up whose backsight is never observed.
+// The expected book was checked line by line by hand.
+TEST(ObsConversion, MatchesHandCheckedBookByteForByte) {
+  EXPECT_EQ(ConvertObs(TestData("obs/codes.obs"), 2), TestData("obs/codes.asc"));
+}
+
+TEST(ObsConversion, DetailRecordsHaveTheFieldsTheReaderNeeds) {
+  const std::string file =
+      "07TP                         S2\r\n"
+      "09F1                         S2           10.000            90.0            10.5\r\n"
+      "09F1                        105          100.000            80.0           110.5\r\n";
+  // Before any 03NM the prism height is 0.0; a plain number keeps its name.
+  EXPECT_EQ(ConvertObs(file, 2),
+            "TR              0.0\r\nDKD S2          \r\n"
+            "0000          00000   10.000   900000    0.0 S2        \r\n"
+            "105         1000000   98.481   800000    0.0\r\n");
+  // Without the Sokkia kind the set-up records are not read.
+  EXPECT_EQ(ConvertObs(file, 3).find("TR"), std::string::npos);
+}
+
+TEST(ObsConversion, IncompleteBlocksStillEnd) {
+  EXPECT_EQ(ConvertObs("02TP             ST1\r\n07TP             ST1", 2),
+            "TR ST1          0.0\r\nDKD             \r\n");
+  EXPECT_EQ(ConvertObs("08KI             ST1   1234", 2),
+            "TR ST1          1234.000    .000      \r\n");
+  EXPECT_EQ(ConvertObs("09F1", 2), "              00000    0.000    00000    0.0\r\n");
+}
+
+TEST(ObsRealData, Sdr33JobWithSixteenCharacterFields) {
+  const std::string book = ConvertObs(RealData("geoeasy-20151125.obs"), 2);
+  // Its known points are all computed (08CO): no control-point records.
+  EXPECT_TRUE(
+      book.starts_with("TR STLEV        0.90000000\r\nDKD KRYSHA      \r\n"
+                       "0000          00000    0.000   801608 0.00000000 KRYSHA    \r\n"));
+  EXPECT_EQ(CountStarting(book, "TR "), 1);
+  EXPECT_EQ(testing::CountLines(book), 2 + 14);
+  // 212.36416667 - 201.27666667 = 11.0875; 79.323 m at 122.85694444 degrees.
+  EXPECT_NE(book.find("0000         110515   66.634  1225125 0.00000000 0004      \r\n"),
+            std::string::npos);
+  EXPECT_TRUE(testing::AllLinesCrLf(book));
+}
+
+}  // namespace
+}  // namespace kavu

@@ -1,0 +1,94 @@
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+
+#include "core/lines.h"
+#include "import/converters.h"
+
+namespace kavu {
+namespace {
+
+std::string ReadData(const std::filesystem::path& path) {
+  const auto bytes = ReadFileBytes(path);
+  EXPECT_TRUE(bytes.has_value()) << path;
+  return bytes.value_or("");
+}
+
+// An observation line: point number in 26-31, reading in 32-35 and 37-40,
+// zenith in 41-44 and 46-49, distance 59-67, prism 68-73, description 75-84.
+std::string Obs(std::string_view number, std::string_view deg, std::string_view mmss,
+                std::string_view desc = "") {
+  std::string line(25, ' ');
+  line += std::string(6 - number.size(), ' ') + std::string(number);
+  line += std::string(4 - deg.size(), ' ') + std::string(deg) + " " + std::string(mmss);
+  line += "  90 0000         ";
+  line += "   10.000";
+  line += "  1.50 ";
+  line += desc;
+  return line;
+}
+
+// Checked by hand. The header line is skipped though it looks like a set-up;
+// ST0 followed by ST1 is dropped; number 0 at 0 00 00 orients ST1 and its
+// column shows the recorded "0"; a 2-character description is dropped; blank
+// zenith, distance and prism give "0", "0.0", "0.0"; 360 30 00 turns to
+// 0 30 00; a blank height gives "0.0"; two number-0 lines in a row: the first
+// is skipped, the second (0 00 02) orients; a reading of 0 00 04 orients a
+// point numbered 5, and 0 00 06 after it turns to 2"; 10 00 00 after an
+// orientation at 350 00 00 becomes 20 00 00; TCVN3 bytes and an inner blank
+// of a description pass through; a set-up as the last record is written.
+TEST(ConvertTcm, GoldenEveryQuirk) {
+  const std::filesystem::path dir = std::filesystem::path(KAVU_TEST_DATA) / "import/tcm";
+  EXPECT_EQ(ConvertTcm(ReadData(dir / "quirks.tcm")), ReadData(dir / "quirks.asc"));
+}
+
+TEST(ConvertTcm, LookAheadAtTheEnds) {
+  // The last record has no successor: a number-0 observation there orients.
+  EXPECT_EQ(ConvertTcm("h\nST1         1.45\n" + Obs("0", "0", "0000", "DC02")),
+            "TR ST1 1.45\r\nDKD DC02\r\n0              0    10.000    900000    1.50 DC02\r\n");
+  // Before any set-up the reference is 0; a number-0 line followed by another
+  // is skipped.
+  EXPECT_EQ(ConvertTcm("h\n" + Obs("0", "1", "0000") + "\n" + Obs("0", "2", "0000")),
+            "DKD \r\n0          20000    10.000    900000    1.50 \r\n");
+  // Every written set-up sets the reference back to 0 (3" here): 1 00 00
+  // stays 1 00 00.
+  EXPECT_EQ(
+      ConvertTcm("h\nA\n" + Obs("0", "0", "0003") + "\nB              1\n" + Obs("7", "1", "0000")),
+      "TR A 0.0\r\nDKD \r\n0          00003    10.000    900000    1.50 \r\n"
+      "TR B 1\r\n7          10000    10.000    900000    1.50 \r\n");
+}
+
+TEST(ConvertTcm, MoreThan4999RecordsAreAllWritten) {
+  std::string file = "header\r\nST1         1.45\r\n" + Obs("0", "0", "0000", "K2");
+  for (int k = 1; k <= 6000; ++k) file += "\r\n" + Obs(std::to_string(k), "10", "0000");
+  const std::vector<std::string> lines = SplitLines(ConvertTcm(file));
+  ASSERT_EQ(lines.size(), 2u + 6001u);
+  EXPECT_EQ(lines.back(), "6000      100000    10.000    900000    1.50 ");
+}
+
+TEST(ConvertTcm, BadInputEndsWithABoundedFieldBook) {
+  EXPECT_EQ(ConvertTcm(""), "");
+  EXPECT_EQ(ConvertTcm("ST1         1.45\r\n"), "");  // the header only
+  // Lines shorter than the columns read: a set-up without height, an
+  // observation with nothing after its point number.
+  EXPECT_EQ(ConvertTcm("h\nS\n                         12"),
+            "TR S 0.0\r\nDKD \r\n12             0       0.0         0     0.0 \r\n");
+  // Not numbers: readings without a value become "0" (and orient), the
+  // distance and prism texts are copied.
+  EXPECT_EQ(ConvertTcm("h\n" + std::string(25, ' ') + "     9 abc defg hij klmn" +
+                       std::string(9, ' ') + "    x.yz   abc"),
+            "DKD \r\n9              0      x.yz         0     abc \r\n");
+  std::string binary("h\n");
+  for (int k = 0; k < 4096; ++k) binary.push_back(static_cast<char>(k * 37 % 256));
+  EXPECT_NO_THROW(ConvertTcm(binary));
+  // A NUL inside a station name passes through.
+  const std::string nul(1, '\0');
+  EXPECT_EQ(ConvertTcm("h\nS" + nul + "T          1.5\n"), "TR S" + nul + "T 1.5\r\n");
+  // A 10 MB line is one record read by its columns.
+  const std::string big = ConvertTcm("h\n" + std::string(10'000'000, 'x'));
+  EXPECT_EQ(big, "TR xxxxxxxxxx xxxxxx\r\n");
+}
+
+}  // namespace
+}  // namespace kavu
