@@ -1,7 +1,109 @@
 #include "products/dxf.h"
 
+#include <cmath>
+#include <string>
+#include <string_view>
+
+#include "core/numbers.h"
+#include "core/text.h"
+
 namespace kavu {
 
-bool indxf(RunState&) { return true; }
+namespace {
+
+// A planar position as drawn: x the northing, y the easting, both to the mm.
+struct Position {
+  double x = 0, y = 0;
+};
+
+Position RoundedPosition(const std::string& textX, const std::string& textY) {
+  return {RoundEven(Val(textX), 3), RoundEven(Val(textY), 3)};
+}
+
+// The ASCII drawing file is written as pairs of lines: a group code, then its
+// value. Group 10 is the drawing's x, which carries the easting Y; group 20
+// carries the northing X. No entity carries a handle (group 5): readers give
+// each entity its own, whereas one handle repeated on every control point
+// makes a reader keep only the last of them.
+class EntityWriter {
+ public:
+  explicit EntityWriter(TextOut& out) : out_(out) {}
+
+  void Pair(std::string_view code, std::string_view value) {
+    out_.Line(code);
+    out_.Line(value);
+  }
+
+  void Point(std::string_view layer, const Position& p, bool controlPoint) {
+    Pair("  0", "POINT");
+    Pair("  8", layer);
+    if (controlPoint) Pair(" 62", "     1");
+    Pair(" 10", ReportNumber(p.y));
+    Pair(" 20", ReportNumber(p.x));
+  }
+
+  // The label sits half a label height north and east of its point.
+  void Label(const Position& p, double offset, double height, std::string_view name,
+             bool controlPoint) {
+    const double lx = RoundEven(p.x + offset, 3);
+    const double ly = RoundEven(p.y + offset, 3);
+    Pair("  0", "TEXT");
+    if (controlPoint) {
+      Pair("  8", "KC-ID");
+      Pair(" 62", "     1");
+    } else {
+      Pair("  8", "DIEM_ID");
+      Pair(" 62", "    3");
+    }
+    Pair(" 10", ReportNumber(ly));
+    Pair(" 20", ReportNumber(lx));
+    Pair(" 30", "0.0");
+    Pair(" 40", ReportNumber(height));
+    Pair("  1", name);
+    Pair(" 41", "0.8");
+  }
+
+ private:
+  TextOut& out_;
+};
+
+}  // namespace
+
+bool indxf(RunState& st) {
+  TextOut out;
+  if (!out.open(st.daufile + ".dxf")) return false;
+
+  // Label height on the ground: millimetres on paper times the scale.
+  double h = Val(st.Htext) * Val(st.Tyle) / 1000;
+  if (!std::isfinite(h) || !std::isfinite(1.5 * h)) h = 0;
+
+  EntityWriter dxf(out);
+  dxf.Pair(" 0", "SECTION");
+  dxf.Pair("  2", "ENTITIES");
+
+  for (const KnownPoint& point : st.MangKhongChe) {
+    const Position p = RoundedPosition(point[1], point[2]);
+    dxf.Point("KC", p, true);
+    st.X = p.x;
+    st.Y = p.y;
+  }
+  for (const KnownPoint& point : st.MangKhongChe) {
+    const Position p = RoundedPosition(point[1], point[2]);
+    dxf.Label(p, h / 2, 1.5 * h, TrimView(point[0]), true);
+  }
+  for (const DetailPoint& point : st.MangToaDoChiTiet) {
+    const Position p = RoundedPosition(point[1], point[2]);
+    dxf.Label(p, h / 2, h, TrimView(point[0]), false);
+    dxf.Point("DIEM", p, false);
+    st.X = p.x;
+    st.Y = p.y;
+  }
+
+  out.Line(" 0");
+  out.Line("ENDSEC");
+  out.Line(" 0");
+  out.Line("EOF");
+  return out.close();
+}
 
 }  // namespace kavu

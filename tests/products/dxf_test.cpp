@@ -1,0 +1,75 @@
+#include "products/dxf.h"
+
+#include <gtest/gtest.h>
+
+#include "tests/products/product_files.h"
+
+namespace kavu {
+namespace {
+
+using testing::Expected;
+using testing::FileBytes;
+using testing::FreshFolder;
+
+RunState DrawingState(const std::string& tyle, const std::string& htext) {
+  RunState st;
+  st.daufile = (FreshFolder() / "JOB1").string();
+  st.Tyle = tyle;
+  st.Htext = htext;
+  return st;
+}
+
+// Scale 1000, 2 mm: detail labels 2 m high, control labels 3 m, both 1 m north
+// and east of their point; drawing x is the easting. The control table holds a
+// TCVN3 name, a point looked up twice (drawn twice), a 12-character name,
+// small numbers written without their leading zero and coordinates that are
+// not numbers (drawn at 0); the details an empty name and exponent forms.
+TEST(Dxf, ControlAndDetailPointsWithTheirLabels) {
+  RunState st = DrawingState("1000", "2.0");
+  st.MangKhongChe = {{"P1", "2345678.123", "567890.456", "12.5"},
+                     {"\xa7\xd3i1", "2345600", "567800.5", ""},
+                     {"P1", "2345678.123", "567890.456", "12.5"},
+                     {"ABCDEFGHIJKL", "0.5", "-0.25", ""},
+                     {"BAD", "abc", "", ""}};
+  st.MangToaDoChiTiet = {{"15          ", "2345678.123", "567890.456", "12.345", "N", ""},
+                         {"            ", "2345700.001", "567900.999", "", "", ""},
+                         {"C\xacng       ", "-12.5", "7", "", "", ""},
+                         {"ABCDEFGHIJKL", "1E3", "2D2", "", "", ""}};
+  ASSERT_TRUE(indxf(st));
+  EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/control_and_detail.dxf"));
+  // The last point drawn stays in X and Y.
+  EXPECT_EQ(st.X, 1000);
+  EXPECT_EQ(st.Y, 200);
+}
+
+TEST(Dxf, NoPointsGivesSectionAndEndOnly) {
+  RunState st = DrawingState("1000", "2.0");
+  ASSERT_TRUE(indxf(st));
+  EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/no_points.dxf"));
+}
+
+// A height that is not a number makes h = 0: labels of height 0 on the point.
+TEST(Dxf, HeightNotANumberPutsLabelsOnThePoint) {
+  RunState st = DrawingState("500", "mm");
+  st.MangToaDoChiTiet = {{"7           ", "100.25", "200.75", "", "", ""}};
+  ASSERT_TRUE(indxf(st));
+  EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf"));
+}
+
+TEST(Dxf, ScaleNotANumberOrOutOfRangeGivesHeightZero) {
+  for (const auto& [tyle, htext] : {std::pair{"", "2.0"}, std::pair{"1D300", "1D300"}}) {
+    RunState st = DrawingState(tyle, htext);
+    st.MangToaDoChiTiet = {{"7           ", "100.25", "200.75", "", "", ""}};
+    ASSERT_TRUE(indxf(st));
+    EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf")) << tyle;
+  }
+}
+
+TEST(Dxf, UnwritableFileIsReported) {
+  RunState st = DrawingState("1000", "2.0");
+  st.daufile = (FreshFolder() / "no such folder" / "JOB1").string();
+  EXPECT_FALSE(indxf(st));
+}
+
+}  // namespace
+}  // namespace kavu

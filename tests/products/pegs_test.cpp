@@ -1,0 +1,188 @@
+#include "products/pegs.h"
+
+#include <gtest/gtest.h>
+
+#include "core/host.h"
+#include "core/run.h"
+#include "tests/products/product_files.h"
+
+namespace kavu {
+namespace {
+
+using testing::Expected;
+using testing::FileBytes;
+using testing::FreshFolder;
+
+// Control points: a name, X and Y longer than their columns (cut to 12, 11
+// and 10), a TCVN3 name, an empty and a negative height.
+const std::vector<KnownPoint> kControl = {
+    {"P1", "2345678.123", "567890.456", "12.5"},
+    {"ABCDEFGHIJKLMN", "12345678.1234", "1234567.1234", ""},
+    {"\xa7\xd3i1", "2345600", "567800.5", "-1.25"},
+};
+
+PegEntry Peg(std::string name, std::string angle, std::string distance, std::string zenith,
+             std::string prism, std::string note) {
+  return {"", name, angle, distance, zenith, prism, note};
+}
+
+void Station(RunState& st, const std::string& tram, const std::string& ccm,
+             const std::string& dinhHuong, const std::string& dong2, std::vector<PegEntry> pegs) {
+  st.TenTram = tram;
+  st.ccm = ccm;
+  st.TenDinhHuong = dinhHuong;
+  st.DongDinhHuong2 = dong2;
+  st.MangCocPhu = std::move(pegs);
+  incocphu(st);
+}
+
+// The head with heights, then: a station line with its instrument height and
+// two pegs without a check record (the second
+// with a 13-character name, a distance that fills its column and a zenith
+// longer than it: each still set off by a space); a station without pegs
+// (nothing); a station without instrument height, a check record, a peg with spaces around its
+// texts and a note, then an 8-character reading that ends the block; a check record and an
+// 8-character reading on the first peg (station lines only).
+TEST(Pegs, HeadAndStationBlocks) {
+  const auto folder = FreshFolder();
+  RunState st;
+  st.fcp = 1;
+  st.fdc = 1;
+  st.MangKhongChe = kControl;
+  st.cpFile.open(folder / "JOB1.cp");
+  st.errFile.open(folder / "JOB1.err");
+
+  WritePegFileHead(st);
+  EXPECT_EQ(st.TenKC.str(), "\xa7\xd3i1        ");
+  EXPECT_EQ(st.StZ.str(), "-1.25     ");
+  Station(st, "ST1", "1.45", "DH1", "",
+          {Peg("M5", "1234530", "45.6", "900000", "1.5", ""),
+           Peg("CP1234567890123", "0", "1234.567", "0895959.5", "1.45", "COC GO")});
+  Station(st, "ST1", "1.45", "M5", "", {});
+  EXPECT_EQ(st.err, 0);
+  Station(
+      st, "M5", "", "ST1", "DKD2 KT2          1234530 100.25",
+      {Peg("M6", " 45 ", " 10.000 ", " 0900000 ", " 1.500 ", "N"),
+       Peg("M7", "12345305", "12", "900000", "1.5", ""), Peg("M8", "1", "1", "900000", "1.5", "")});
+  EXPECT_EQ(st.err, 1);
+  Station(st, "M6", "1.5", "M5", "DKD2 ST1          3595958 24.41",
+          {Peg("M9", "123453.5", "12", "900000", "1.5", "")});
+  EXPECT_EQ(st.err, 2);
+
+  ASSERT_TRUE(st.cpFile.close());
+  ASSERT_TRUE(st.errFile.close());
+  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
+  EXPECT_EQ(FileBytes(folder / "JOB1.err"),
+            "\r\nDiem M7           nhap sai phan do\r\n"
+            "\r\nDiem M9           nhap sai phan do\r\n");
+}
+
+TEST(Pegs, HeadWithoutHeights) {
+  const auto folder = FreshFolder();
+  RunState st;
+  st.fcp = 1;
+  st.fdc = 0;
+  st.MangKhongChe = kControl;
+  st.cpFile.open(folder / "JOB1.cp");
+  WritePegFileHead(st);
+  ASSERT_TRUE(st.cpFile.close());
+  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/head_without_heights.cp"));
+}
+
+// Without the box ticked nothing is written and nothing is checked.
+TEST(Pegs, NothingWhenNotTicked) {
+  const auto folder = FreshFolder();
+  RunState st;
+  st.fcp = 0;
+  st.MangKhongChe = kControl;
+  st.cpFile.open(folder / "JOB1.cp");
+  WritePegFileHead(st);
+  Station(st, "ST1", "1.45", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
+  ASSERT_TRUE(st.cpFile.close());
+  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), "");
+  EXPECT_EQ(st.err, 0);
+}
+
+}  // namespace
+}  // namespace kavu
+
+namespace kavu {
+namespace {
+
+RunState RunOn(const std::filesystem::path& fieldBook) {
+  RunState st;
+  st.txtfile = fieldBook.string();
+  st.ftd = 0;
+  st.fdc = 1;
+  st.fcp = 1;
+  st.seed = 1;
+  return st;
+}
+
+void WriteFile(const std::filesystem::path& path, std::string_view text) {
+  TextOut out(path);
+  out.Write(text);
+  ASSERT_TRUE(out.close());
+}
+
+// The peg file of one run serves the next: as the common control-point file
+// its head gives the known points, and as a field book its station blocks
+// give each peg again as a detail point, at the coordinates the peg got.
+TEST(Pegs, PegFileIsReadBackByTheNextRun) {
+  const auto folder = FreshFolder();
+  const auto book = folder / "JOB1.asc";
+  WriteFile(book,
+            "TR ST1 2345678.123 567890.456 12.5\r\n"
+            "TR DH1 2345578.123 567890.456 10.0\r\n"
+            "TR ST1 1.45\r\n"
+            "DKD DH1\r\n"
+            "1 1234530 45.6 900000 1.5\r\n"
+            "2 2700000 30.25 900000 1.5 CP5\r\n"
+            "TR CP5 1.5\r\n"
+            "DKD ST1\r\n"
+            "3 1800000 20 900000 1.5\r\n");
+  QuietHost host;
+  RunState first = RunOn(book);
+  ASSERT_EQ(tinh_Click(first, host).outcome, RunOutcome::Completed);
+  ASSERT_EQ(first.err, 0);
+  ASSERT_EQ(first.sdkc(), 3);  // ST1, DH1 and the peg CP5
+  const KnownPoint peg = first.MangKhongChe[2];
+  ASSERT_EQ(Trim(peg[0]), "CP5");
+  const std::string cp = FileBytes(folder / "JOB1.cp");
+  EXPECT_EQ(cp,
+            "TR ST1          2345678.123 567890.456 12.5      \r\n"
+            "TR DH1          2345578.123 567890.456 10.0      \r\n"
+            "TR ST1         \r\n"
+            "DKD1 DH1         \r\n"
+            " CP5          2700000   30.25  900000 1.5 \r\n");
+
+  // As the common control-point file of a run on the same observations.
+  const auto again = folder / "JOB2.asc";
+  WriteFile(again, "TR ST1 1.45\r\nDKD DH1\r\n1 1234530 45.6 900000 1.5\r\n");
+  RunState second = RunOn(again);
+  second.ckKC = 1;
+  second.txtFKC = (folder / "JOB1.cp").string();
+  ASSERT_EQ(tinh_Click(second, host).outcome, RunOutcome::Completed);
+  EXPECT_EQ(second.err, 0);
+  ASSERT_EQ(second.sdtd(), 1);
+  EXPECT_EQ(second.MangToaDoChiTiet[0], first.MangToaDoChiTiet[0]);
+
+  // As a field book: the peg comes back as a detail point at its place. The
+  // block's station line carries no instrument height, which the run reports,
+  // so the height comes out lower by the 1.45 m of the first run.
+  const auto asBook = folder / "JOB3.asc";
+  WriteFile(asBook, cp);
+  RunState third = RunOn(asBook);
+  ASSERT_EQ(tinh_Click(third, host).outcome, RunOutcome::Completed);
+  EXPECT_EQ(third.err, 1);
+  ASSERT_EQ(third.sdtd(), 1);
+  const DetailPoint& point = third.MangToaDoChiTiet[0];
+  EXPECT_EQ(Trim(point[0]), "CP5");
+  EXPECT_EQ(point[1], peg[1]);
+  EXPECT_EQ(point[2], peg[2]);
+  EXPECT_EQ(point[3], "11.000    ");
+  EXPECT_EQ(peg[3], "12.450    ");
+}
+
+}  // namespace
+}  // namespace kavu
