@@ -119,19 +119,13 @@ RunState RunOn(const std::filesystem::path& fieldBook) {
   return st;
 }
 
-void WriteFile(const std::filesystem::path& path, std::string_view text) {
-  TextOut out(path);
-  out.Write(text);
-  ASSERT_TRUE(out.close());
-}
-
 // The peg file of one run serves the next: as the common control-point file
 // its head gives the known points, and as a field book its station blocks
 // give each peg again as a detail point, at the coordinates the peg got.
 TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   const auto folder = FreshFolder();
   const auto book = folder / "JOB1.asc";
-  WriteFile(book,
+  testing::WriteBytes(book,
             "TR ST1 2345678.123 567890.456 12.5\r\n"
             "TR DH1 2345578.123 567890.456 10.0\r\n"
             "TR ST1 1.45\r\n"
@@ -158,7 +152,7 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
 
   // As the common control-point file of a run on the same observations.
   const auto again = folder / "JOB2.asc";
-  WriteFile(again, "TR ST1 1.45\r\nDKD DH1\r\n1 1234530 45.6 900000 1.5\r\n");
+  testing::WriteBytes(again, "TR ST1 1.45\r\nDKD DH1\r\n1 1234530 45.6 900000 1.5\r\n");
   RunState second = RunOn(again);
   second.ckKC = 1;
   second.txtFKC = (folder / "JOB1.cp").string();
@@ -171,7 +165,7 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   // block's station line carries no instrument height, which the run reports,
   // so the height comes out lower by the 1.45 m of the first run.
   const auto asBook = folder / "JOB3.asc";
-  WriteFile(asBook, cp);
+  testing::WriteBytes(asBook, cp);
   RunState third = RunOn(asBook);
   ASSERT_EQ(tinh_Click(third, host).outcome, RunOutcome::Completed);
   EXPECT_EQ(third.err, 1);
