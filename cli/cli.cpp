@@ -164,29 +164,27 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
       "field book, checks every observation and writes the products asked for.",
       "kavu-cli"};
   app.footer(std::string(kFooter));
+  app.get_formatter()->column_width(26);
   app.set_version_flag("--version", "kavu-cli 0.1");
 
   app.add_option("FILE", set.file, "the field book (.asc) or instrument file to compute")
       ->required();
-  auto* control = app.add_option(
-      "--control-file", set.controlFile,
-      "take the control points from this common control-point file instead of FILE's own "
-      "control-point records");
-  control->type_name("PATH");
+  app.add_option("--control-file", set.controlFile,
+                 "take the control points from this common file, not from FILE")
+      ->type_name("PATH");
   app.add_option("--kind", set.kind,
-                 "kind of FILE: auto (from its extension), 0 field book, 1 SDR, 2 Sokkia "
-                 ".obs, 3 SET, 4 RAW, 5 Topcom .idx, 6 Topcom 226 .tcm, 7 GRE, 8 DN7, "
-                 "9 other (default: auto)")
+                 "kind of FILE (default: auto, from its extension): 0 field book,\n"
+                 "1 SDR, 2 Sokkia .obs, 3 SET, 4 RAW, 5 Topcom .idx,\n"
+                 "6 Topcom 226 .tcm, 7 GRE, 8 DN7, 9 other")
       ->type_name("auto|0..9");
   app.add_option("--scale", set.scale,
-                 "map scale denominator; sets the distance and duplicate tolerance "
-                 "(default: 1000)")
+                 "map scale denominator: sets the distance tolerance (default: 1000)")
       ->type_name("TEXT");
   app.add_option("--text-height", set.textHeight,
-                 "label height in millimetres for the drawing file (default: 2.0)")
+                 "label height in mm in the drawing file (default: 2.0)")
       ->type_name("TEXT");
   app.add_option("--height-decimals", set.heightDecimals,
-                 "decimal places of the heights in the coordinate text file (default: 2)")
+                 "decimals of the heights in the coordinate text file (default: 2)")
       ->type_name("TEXT");
 
   app.add_flag("--asc", set.asc, "write the regenerated field book and its companion file");
@@ -196,12 +194,17 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   app.add_flag("--pegs", set.pegs, "write the auxiliary-peg file");
   app.add_flag("--kc", set.kc, "write the control-coordinate file");
   app.add_flag("--all", set.all, "write all six products");
-  app.add_flag("--heights,!--no-heights", set.heights,
-               "compute the heights of the detail points, or not (default: --heights)");
+  // Each flag sets the value as it is met, so the last one given wins.
+  app.add_flag_callback(
+         "--heights", [&set] { set.heights = true; },
+         "compute the detail points' heights (the default)")
+      ->trigger_on_parse();
+  app.add_flag_callback(
+         "--no-heights", [&set] { set.heights = false; }, "do not compute them")
+      ->trigger_on_parse();
   app.add_option("--seed", set.seed,
-                 "seed of the pseudo-random generator (readings made up for check records "
-                 "without one, orientation rows of the field sketch): the same seed gives the "
-                 "same products; without it the clock seeds it")
+                 "seed of the pseudo-random generator, so that a run can be repeated\n"
+                 "(default: the clock)")
       ->type_name("N");
   for (std::size_t i = 0; i < kHeaderOptions.size(); ++i) {
     const HeaderOption& h = kHeaderOptions[i];

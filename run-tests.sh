@@ -1,0 +1,42 @@
+#!/usr/bin/env bash
+# Builds everything and runs every test: ./run-tests.sh [debug|asan]
+# (default debug; asan is the AddressSanitizer + UndefinedBehaviorSanitizer
+# build). Installs what is missing (Debian 12) with apt-get first.
+set -euo pipefail
+cd "$(dirname "$0")"
+preset="${1:-debug}"
+case "$preset" in
+  debug | asan | release) ;;
+  *) echo "usage: $0 [debug|asan|release]" >&2; exit 64 ;;
+esac
+
+packages=(cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev xvfb xauth python3-ezdxf
+  libbenchmark-dev)
+missing=()
+for p in "${packages[@]}"; do
+  dpkg-query -W -f='${db:Status-Status}' "$p" 2>/dev/null | grep -qx installed || missing+=("$p")
+done
+if ((${#missing[@]})); then
+  sudo=()
+  [ "$(id -u)" -eq 0 ] || sudo=(sudo)
+  echo "Installing: ${missing[*]}"
+  "${sudo[@]}" apt-get update
+  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y --no-install-recommends \
+    "${missing[@]}"
+fi
+
+export CMAKE_GENERATOR=Ninja
+cmake --preset "$preset"
+cmake --build --preset "$preset" --parallel "$(nproc)"
+
+# Leaks of the system libraries that Qt loads are not ours.
+if [ "$preset" = asan ]; then
+  export LSAN_OPTIONS="suppressions=$PWD/tests/lsan.supp${LSAN_OPTIONS:+:$LSAN_OPTIONS}"
+fi
+
+# The window's tests need a display: a virtual one when there is none.
+run=()
+if [ -z "${DISPLAY:-}" ] && command -v xvfb-run >/dev/null; then
+  run=(xvfb-run -a)
+fi
+"${run[@]}" ctest --preset "$preset"
