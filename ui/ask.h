@@ -1,0 +1,48 @@
+// Modal message boxes of the program's windows. Every question goes through
+// one Asker, so a test can answer them instead of a person.
+#pragma once
+
+#include <QString>
+#include <functional>
+#include <string_view>
+
+#include "core/host.h"
+
+class QWidget;
+
+namespace kavu::ui {
+
+inline QString Q(std::string_view text) {
+  return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
+}
+
+struct Question {
+  QString text;  // lines separated by a lone CR or by LF
+  MsgIcon icon = MsgIcon::None;
+  MsgButtons buttons = MsgButtons::Ok;
+  bool defaultNo = false;  // No is the default button of a Yes/No box
+};
+
+class Asker {
+ public:
+  using Hook = std::function<MsgAnswer(const Question&)>;
+
+  explicit Asker(QWidget* parent = nullptr) : parent_(parent) {}
+  // Shows the box (or hands it to the hook) and returns the answer.
+  MsgAnswer operator()(const Question& question) const;
+  MsgAnswer operator()(const QString& text, MsgIcon icon, MsgButtons buttons,
+                       bool defaultNo = false) const {
+    return (*this)(Question{text, icon, buttons, defaultNo});
+  }
+  void setHook(Hook hook) { hook_ = std::move(hook); }
+  void setParent(QWidget* parent) { parent_ = parent; }
+
+ private:
+  QWidget* parent_;
+  Hook hook_;
+};
+
+// The message box itself, captioned with the program's title.
+MsgAnswer ShowMessageBox(QWidget* parent, const Question& question);
+
+}  // namespace kavu::ui

@@ -1,0 +1,30 @@
+// A window of the program: Enter presses its default button, Esc its cancel
+// button; closing it runs its own closing steps.
+#pragma once
+
+#include <QDialog>
+
+class QPushButton;
+
+namespace kavu::ui {
+
+class Window : public QDialog {
+  Q_OBJECT
+ public:
+  explicit Window(QWidget* parent = nullptr);
+
+ protected:
+  void setCancelButton(QPushButton* button) { cancel_ = button; }
+  void keyPressEvent(QKeyEvent* event) override;
+  // Closing goes through closeEvent only, never through reject().
+  void reject() override;
+  void closeEvent(QCloseEvent* event) override;
+
+ private:
+  QPushButton* cancel_ = nullptr;
+};
+
+// A push button with its object name and caption.
+QPushButton* MakeButton(QWidget* parent, const char* name, const QString& caption);
+
+}  // namespace kavu::ui

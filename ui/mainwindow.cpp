@@ -1,0 +1,513 @@
+#include "ui/mainwindow.h"
+
+#include <QApplication>
+#include <QCheckBox>
+#include <QCloseEvent>
+#include <QComboBox>
+#include <QDir>
+#include <QFile>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QGridLayout>
+#include <QGroupBox>
+#include <QHBoxLayout>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPushButton>
+#include <QTextBrowser>
+#include <QVBoxLayout>
+
+#include "core/lines.h"
+#include "core/messages.h"
+#include "core/tcvn3.h"
+#include "import/dispatch.h"
+#include "ui/editor.h"
+#include "ui/lists.h"
+#include "ui/nhapsdo.h"
+#include "ui/settings.h"
+#include "ui/texts.h"
+#include "ui/timthay.h"
+
+namespace kavu::ui {
+namespace {
+
+// fsdo and fdxf start grayed; a click makes them ordinary boxes, the first
+// click ticking them.
+class ThreeStateBox : public QCheckBox {
+ public:
+  using QCheckBox::QCheckBox;
+
+ protected:
+  void nextCheckState() override {
+    if (checkState() == Qt::PartiallyChecked) {
+      setTristate(false);
+      setCheckState(Qt::Checked);
+    } else {
+      QCheckBox::nextCheckState();
+    }
+  }
+};
+
+QCheckBox* MakeBox(QWidget* parent, const char* name, std::string_view caption) {
+  auto* box = new QCheckBox(Q(caption), parent);
+  box->setObjectName(QLatin1String(name));
+  return box;
+}
+
+QLabel* MakeLabel(QWidget* parent, const char* name, std::string_view caption) {
+  auto* label = new QLabel(Q(caption), parent);
+  label->setObjectName(QLatin1String(name));
+  return label;
+}
+
+QLineEdit* MakeEdit(QWidget* parent, const char* name, const QString& text) {
+  auto* edit = new QLineEdit(text, parent);
+  edit->setObjectName(QLatin1String(name));
+  return edit;
+}
+
+// A whole number stored as text, or nothing.
+std::optional<int> StoredInt(const QString& text) {
+  bool ok = false;
+  const int value = text.trimmed().toInt(&ok);
+  if (!ok) return std::nullopt;
+  return value;
+}
+
+// A stored state applied to a two-state box; other values leave it as it is.
+void RestoreBox(QCheckBox* box, const QString& stored) {
+  const std::optional<int> state = StoredInt(stored);
+  if (state == 0) box->setCheckState(Qt::Unchecked);
+  if (state == 1) box->setCheckState(Qt::Checked);
+}
+
+std::string Std(const QString& text) { return text.toStdString(); }
+
+#ifdef _WIN32
+constexpr const char* kDefaultFolder = "c:\\";
+#endif
+
+}  // namespace
+
+int BoxState(const QCheckBox* box) {
+  switch (box->checkState()) {
+    case Qt::Checked:
+      return 1;
+    case Qt::PartiallyChecked:
+      return 2;
+    case Qt::Unchecked:
+      break;
+  }
+  return 0;
+}
+
+MainWindow::MainWindow(QWidget* parent) : Window(parent), ask_(this) {
+  setObjectName(QStringLiteral("kavu"));
+  setWindowTitle(Q(kMainCaption));
+  endHook_ = [] { QCoreApplication::quit(); };
+  chooseControlFile_ = [this] {
+    return QFileDialog::getOpenFileName(this, Q(kChooseKcFile), lsttm_->path());
+  };
+  buildControls();
+  timthay_ = new Timthay(
+      ask_,
+      [this](int ktra) -> QPlainTextEdit* {
+        return ktra == 1 ? suasl_->txtsuasl() : xem_->txtxem();
+      },
+      this);
+  xem_ = new Xem(ask_, *timthay_, this);
+  suasl_ = new Suasl(ask_, *timthay_, *xem_, this);
+  // Before the settings apply, the lists stand at the working folder.
+  {
+    const QSignalBlocker block(lstdia_);
+    lstdia_->setCurrentIndex(std::max(0, lstdia_->indexOfPath(QDir::currentPath())));
+  }
+  lsttm_->setPath(QDir::currentPath());
+  Form_Load();
+}
+
+MainWindow::~MainWindow() = default;
+
+void MainWindow::buildControls() {
+  auto* lbtieude = MakeLabel(this, "lbtieude", kTitleLabel);
+  QFont titleFont = lbtieude->font();
+  titleFont.setBold(true);
+  titleFont.setPointSizeF(titleFont.pointSizeF() * 1.3);
+  lbtieude->setFont(titleFont);
+  lbtieude->setAlignment(Qt::AlignCenter);
+
+  auto* lbdia = MakeLabel(this, "lbdia", kDrives);
+  lstdia_ = new DriveList(this);
+  lstdia_->setObjectName(QStringLiteral("lstdia"));
+  auto* lbtm = MakeLabel(this, "lbtm", kDirectory);
+  lsttm_ = new FolderList(this);
+  lsttm_->setObjectName(QStringLiteral("lsttm"));
+  txttm_ = MakeLabel(this, "txttm", "");
+  auto* lbkieu = MakeLabel(this, "lbkieu", kFilesOfType);
+  cbkieu_ = new QComboBox(this);
+  cbkieu_->setObjectName(QStringLiteral("cbkieu"));
+  for (std::string_view kind : kKinds) cbkieu_->addItem(Q(kind));
+  lstfile_ = new FileList(this);
+  lstfile_->setObjectName(QStringLiteral("lstfile"));
+  auto* lbfile = MakeLabel(this, "lbfile", kFile);
+  txtfile_ = MakeEdit(this, "txtfile", QString());
+
+  auto* luachon = new QGroupBox(Q(kOptions), this);
+  luachon->setObjectName(QStringLiteral("luachon"));
+  fasc_ = MakeBox(luachon, "fasc", kMakeAsc);
+  ftd_ = MakeBox(luachon, "ftd", kMakeTxt);
+  fdc_ = MakeBox(luachon, "fdc", kHeights);
+  fsdo_ = new ThreeStateBox(Q(kMakeSketch), luachon);
+  fsdo_->setObjectName(QStringLiteral("fsdo"));
+  fdxf_ = new ThreeStateBox(Q(kMakeDxf), luachon);
+  fdxf_->setObjectName(QStringLiteral("fdxf"));
+  for (QCheckBox* box : {fsdo_, fdxf_}) {
+    box->setTristate(true);
+    box->setCheckState(Qt::PartiallyChecked);
+  }
+  fcp_ = MakeBox(luachon, "fcp", kMakePegs);
+  fkc_ = MakeBox(luachon, "fkc", kMakeKc);
+  auto* options = new QVBoxLayout(luachon);
+  for (QCheckBox* box : {fasc_, ftd_, fdc_, fsdo_, fdxf_, fcp_, fkc_}) options->addWidget(box);
+
+  auto* frame1 = new QFrame(this);
+  frame1->setObjectName(QStringLiteral("Frame1"));
+  frame1->setFrameShape(QFrame::HLine);
+  frame1->setFrameShadow(QFrame::Sunken);
+
+  auto* label1 = MakeLabel(this, "Label1", kScale);
+  TyleTXT_ = new QComboBox(this);
+  TyleTXT_->setObjectName(QStringLiteral("TyleTXT"));
+  TyleTXT_->setEditable(true);
+  TyleTXT_->setInsertPolicy(QComboBox::NoInsert);
+  for (std::string_view scale : kScales) TyleTXT_->addItem(Q(scale));
+  TyleTXT_->setCurrentText(QStringLiteral("5000"));
+  auto* label2 = MakeLabel(this, "Label2", kTextHeight);
+  Htxt_ = MakeEdit(this, "Htxt", QStringLiteral("2.0"));
+  auto* label3 = MakeLabel(this, "Label3", kHeightDecimals);
+  txtSoleDC_ = MakeEdit(this, "txtSoleDC", QStringLiteral("2"));
+  ckKC_ = MakeBox(this, "ckKC", kUseCommonKc);
+  txtFKC_ = MakeEdit(this, "txtFKC", QString());
+  auto* kc = MakeButton(this, "KC", Q(kKcButton));
+
+  auto* tinh = MakeButton(this, "tinh", Q(kCompute));
+  tinh->setDefault(true);
+  auto* suasolieu = MakeButton(this, "suasolieu", Q(kEditData));
+  auto* trogiup = MakeButton(this, "trogiup", Q(kHelp));
+  auto* thoat = MakeButton(this, "thoat", Q(kExit));
+  setCancelButton(thoat);
+
+  // Layout: the lists on the left, the options on the right, the buttons below.
+  auto* grid = new QGridLayout(this);
+  grid->addWidget(lbtieude, 0, 0, 1, 3);
+  auto* left = new QGridLayout;
+  left->addWidget(lbdia, 0, 0);
+  left->addWidget(lstdia_, 1, 0);
+  left->addWidget(lbtm, 2, 0);
+  left->addWidget(lsttm_, 3, 0);
+  left->addWidget(txttm_, 4, 0);
+  left->addWidget(lbkieu, 0, 1);
+  left->addWidget(cbkieu_, 1, 1);
+  left->addWidget(lstfile_, 2, 1, 3, 1);
+  grid->addLayout(left, 1, 0, 1, 2);
+  auto* fileRow = new QHBoxLayout;
+  fileRow->addWidget(lbfile);
+  fileRow->addWidget(txtfile_);
+  grid->addLayout(fileRow, 2, 0, 1, 3);
+
+  auto* right = new QVBoxLayout;
+  right->addWidget(luachon);
+  right->addWidget(frame1);
+  auto* numbers = new QGridLayout;
+  numbers->addWidget(label1, 0, 0);
+  numbers->addWidget(TyleTXT_, 0, 1);
+  numbers->addWidget(label2, 1, 0);
+  numbers->addWidget(Htxt_, 1, 1);
+  numbers->addWidget(label3, 2, 0);
+  numbers->addWidget(txtSoleDC_, 2, 1);
+  right->addLayout(numbers);
+  right->addStretch();
+  grid->addLayout(right, 1, 2);
+
+  auto* kcRow = new QHBoxLayout;
+  kcRow->addWidget(ckKC_);
+  kcRow->addWidget(txtFKC_, 1);
+  kcRow->addWidget(kc);
+  grid->addLayout(kcRow, 3, 0, 1, 3);
+  auto* buttons = new QHBoxLayout;
+  buttons->addStretch();
+  for (QPushButton* button : {tinh, suasolieu, trogiup, thoat}) buttons->addWidget(button);
+  buttons->addStretch();
+  grid->addLayout(buttons, 4, 0, 1, 3);
+  grid->setColumnStretch(0, 1);
+  grid->setColumnStretch(1, 1);
+  resize(760, 520);
+
+  connect(cbkieu_, &QComboBox::activated, this, &MainWindow::cbkieu_Click);
+  connect(lstdia_, &QComboBox::currentIndexChanged, this, &MainWindow::lstdia_Change);
+  connect(lsttm_, &FolderList::pathChanged, this, &MainWindow::lsttm_Change);
+  connect(lstfile_, &QListWidget::itemClicked, this, &MainWindow::lstfile_Click);
+  connect(lstfile_, &QListWidget::itemDoubleClicked, this, &MainWindow::lstfile_DblClick);
+  connect(fsdo_, &QCheckBox::clicked, this, &MainWindow::fsdo_Click);
+  connect(kc, &QPushButton::clicked, this, &MainWindow::KC_Click);
+  connect(tinh, &QPushButton::clicked, this, &MainWindow::tinh_Click);
+  connect(suasolieu, &QPushButton::clicked, this, &MainWindow::suasolieu_Click);
+  connect(trogiup, &QPushButton::clicked, this, &MainWindow::trogiup_Click);
+  connect(thoat, &QPushButton::clicked, this, &MainWindow::thoat_Click);
+}
+
+void MainWindow::Form_Load() {
+  const SettingsStore store;
+  txtFKC_->setText(store.read("KAVU_txtFKC", QString()));
+  RestoreBox(ckKC_, store.read("KAVU_ckKC", QStringLiteral("0")));
+  if (const std::optional<int> kind = StoredInt(store.read("KAVU_cbkieu", QStringLiteral("0")))) {
+    setKind(*kind);
+  }
+  // From here a stored value that cannot be applied is passed over.
+  if (const std::optional<int> drive = StoredInt(store.read("KAVU_LstDia", QStringLiteral("1")))) {
+    setDrive(*drive);
+  }
+#ifdef _WIN32
+  const QString defaultFolder = QString::fromLatin1(kDefaultFolder);
+#else
+  // There is no drive C: here; the user's home folder takes its place.
+  const QString defaultFolder = QDir::toNativeSeparators(QDir::homePath());
+#endif
+  lsttm_->setPath(store.read("KAVU_LstTM", defaultFolder));
+  TyleTXT_->setCurrentText(store.read("KAVU_TyleTXT", QStringLiteral("1000")));
+  Htxt_->setText(store.read("KAVU_HTXT", QStringLiteral("2.0")));
+  txtSoleDC_->setText(store.read("KAVU_SoleDC", QStringLiteral("2")));
+  RestoreBox(fkc_, store.read("KAVU_Fkc", QStringLiteral("0")));
+  RestoreBox(fasc_, store.read("KAVU_Fasc", QStringLiteral("0")));
+  RestoreBox(ftd_, store.read("KAVU_Ftd", QStringLiteral("1")));
+  RestoreBox(fcp_, store.read("KAVU_Fcp", QStringLiteral("0")));
+  RestoreBox(fdc_, store.read("KAVU_Fdc", QStringLiteral("1")));
+  txttm_->setText(ShortFolderText(lsttm_->path()));
+}
+
+void MainWindow::GhiCaiDat() {
+  SettingsStore store;
+  store.write("KAVU_txtFKC", txtFKC_->text());
+  store.write("KAVU_ckKC", QString::number(BoxState(ckKC_)));
+  store.write("KAVU_cbkieu", QString::number(cbkieu_->currentIndex()));
+  store.write("KAVU_LstDia", QString::number(lstdia_->currentIndex()));
+  store.write("KAVU_LstTM", lsttm_->path());
+  store.write("KAVU_TyleTXT", TyleTXT_->currentText());
+  store.write("KAVU_HTXT", Htxt_->text());
+  store.write("KAVU_SoleDC", txtSoleDC_->text());
+  store.write("KAVU_Fkc", QString::number(BoxState(fkc_)));
+  store.write("KAVU_Fasc", QString::number(BoxState(fasc_)));
+  store.write("KAVU_Ftd", QString::number(BoxState(ftd_)));
+  store.write("KAVU_Fcp", QString::number(BoxState(fcp_)));
+  store.write("KAVU_Fdc", QString::number(BoxState(fdc_)));
+}
+
+void MainWindow::setKind(int index) {
+  if (index < 0 || index >= cbkieu_->count()) return;
+  {
+    const QSignalBlocker block(cbkieu_);
+    cbkieu_->setCurrentIndex(index);
+  }
+  cbkieu_Click(index);
+}
+
+void MainWindow::setDrive(int index) {
+  if (index < 0 || index >= lstdia_->count()) return;
+  {
+    const QSignalBlocker block(lstdia_);
+    lstdia_->setCurrentIndex(index);
+  }
+  lstdia_Change();
+}
+
+void MainWindow::cbkieu_Click(int index) {
+  if (index < 0 || index > 9) return;
+  lstfile_->setPattern(Q(PatternOfKind(index)));
+}
+
+void MainWindow::lstdia_Change() { lsttm_->setPath(lstdia_->root(lstdia_->currentIndex())); }
+
+void MainWindow::lsttm_Change(const QString& path) {
+  lstfile_->setPath(path);
+  txttm_->setText(ShortFolderText(path));
+}
+
+void MainWindow::lstfile_Click(QListWidgetItem* item) {
+  if (item == nullptr) return;
+  const QString path = QDir::toNativeSeparators(QDir(lstfile_->path()).filePath(item->text()));
+  DeriveFileSelection(st_, Std(path));
+  txtfile_->setText(Q(st_.filesl));
+}
+
+void MainWindow::lstfile_DblClick(QListWidgetItem* item) {
+  lstfile_Click(item);
+  tinh_Click();
+}
+
+void MainWindow::collectWindowFields() {
+  st_.txtfile = Std(txtfile_->text());
+  st_.cbkieu = cbkieu_->currentIndex();
+  st_.fasc = BoxState(fasc_);
+  st_.ftd = BoxState(ftd_);
+  st_.fdc = BoxState(fdc_);
+  st_.fsdo = BoxState(fsdo_);
+  st_.fdxf = BoxState(fdxf_);
+  st_.fcp = BoxState(fcp_);
+  st_.fkc = BoxState(fkc_);
+  st_.ckKC = BoxState(ckKC_);
+  st_.TyleTXT = Std(TyleTXT_->currentText());
+  st_.Htxt = Std(Htxt_->text());
+  st_.txtSoleDC = Std(txtSoleDC_->text());
+  st_.txtFKC = Std(txtFKC_->text());
+  // The header texts go to the field sketch only; reading them loads the
+  // form (from the store) when it is not loaded.
+  if (Ticked(st_.fsdo)) {
+    const std::array<QString, 7> texts = headerForm().texts();
+    for (std::size_t i = 0; i < texts.size(); ++i) st_.nhapsdo[i] = Utf8ToTcvn3(Std(texts[i]));
+  }
+}
+
+void MainWindow::tinh_Click() {
+  if (running_ || ending_) return;
+  running_ = true;
+  collectWindowFields();
+  QApplication::setOverrideCursor(Qt::WaitCursor);
+  lastRun_ = kavu::tinh_Click(st_, *this);
+  QApplication::restoreOverrideCursor();
+  running_ = false;
+  if (lastRun_.outcome == RunOutcome::Completed && lastRun_.answer == MsgAnswer::No) {
+    // No to "continue?" ends the program; the session's choices are kept.
+    writeSettingsOnce();
+    endProgram();
+  }
+}
+
+Nhapsdo& MainWindow::headerForm() {
+  if (nhapsdo_.isNull()) nhapsdo_ = new Nhapsdo(this);
+  return *nhapsdo_;
+}
+
+void MainWindow::fsdo_Click() {
+  if (BoxState(fsdo_) != 1) return;
+  Nhapsdo& form = headerForm();
+  form.show();
+  form.raise();
+}
+
+void MainWindow::KC_Click() {
+  const QString chosen = chooseControlFile_ ? chooseControlFile_() : QString();
+  if (chosen.isEmpty()) return;  // cancelled: the box and the tick stay
+  txtFKC_->setText(QDir::toNativeSeparators(chosen));
+  if (!txtFKC_->text().trimmed().isEmpty()) ckKC_->setCheckState(Qt::Checked);
+}
+
+void MainWindow::suasolieu_Click() {
+  const QString filesl = Q(st_.filesl);
+  if (txtfile_->text().isEmpty() || !QFileInfo(filesl).isFile()) {
+    tbao_ = ask_(Q(kFileNotFoundShort) + filesl, MsgIcon::Critical, MsgButtons::Ok);
+    return;
+  }
+  const std::optional<std::string> bytes = ReadFileBytes(st_.filesl);
+  if (!bytes) {
+    tbao_ = ask_(Q(msg::kCannotOpen) + filesl, MsgIcon::Critical, MsgButtons::Ok);
+    return;
+  }
+  suasl_->openFile(filesl, Q(st_.daufile), Q(st_.tentm),
+                   DecodeForScreen(QByteArray(bytes->data(), bytes->size())));
+}
+
+void MainWindow::trogiup_Click() {
+  const QString path = QDir::toNativeSeparators(QCoreApplication::applicationDirPath() +
+                                                QStringLiteral("/kavu.hlp"));
+  QFile file(path);
+  if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly)) {
+    tbao_ = ask_(Q(kFileNotFoundShort) + path, MsgIcon::Critical, MsgButtons::Ok);
+    return;
+  }
+  if (help_.isNull()) {
+    help_ = new Window(this);
+    help_->setObjectName(QStringLiteral("help"));
+    help_->setWindowTitle(Q(kViewerCaption));
+    auto* browser = new QTextBrowser(help_);
+    browser->setObjectName(QStringLiteral("helptext"));
+    auto* layout = new QVBoxLayout(help_);
+    layout->addWidget(browser);
+    help_->resize(640, 560);
+  }
+  auto* browser = help_->findChild<QTextBrowser*>(QStringLiteral("helptext"));
+  browser->setHtml(QString::fromUtf8(file.readAll()));
+  help_->show();
+  help_->raise();
+}
+
+void MainWindow::thoat_Click() {
+  Beep();
+  tbao_ = ask_(Q(kExitQuestion), MsgIcon::Question, MsgButtons::YesNo);
+  if (tbao_ != MsgAnswer::Yes) return;
+  writeSettingsOnce();
+  endProgram();
+}
+
+void MainWindow::writeSettingsOnce() {
+  if (settingsWritten_) return;
+  settingsWritten_ = true;
+  GhiCaiDat();
+}
+
+void MainWindow::endProgram() {
+  if (ending_) return;
+  ending_ = true;
+  // The other windows close with their own closing steps (the header form
+  // keeps its texts).
+  if (!nhapsdo_.isNull()) nhapsdo_->close();
+  for (QWidget* window : {static_cast<QWidget*>(timthay_), static_cast<QWidget*>(xem_),
+                          static_cast<QWidget*>(suasl_), static_cast<QWidget*>(help_.data())}) {
+    if (window != nullptr) window->close();
+  }
+  close();
+  if (endHook_) endHook_();
+}
+
+void MainWindow::closeEvent(QCloseEvent* event) {
+  writeSettingsOnce();
+  event->accept();
+  if (!ending_) endProgram();
+}
+
+MsgAnswer MainWindow::MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) {
+  tbao_ = ask_(Q(text), icon, buttons);
+  return tbao_;
+}
+
+void MainWindow::SetTitle(std::string_view title) {
+  setWindowTitle(Q(title));
+  // Let the title show during the run; the user's input waits for its end.
+  QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
+}
+
+void MainWindow::Beep() { QApplication::beep(); }
+
+void MainWindow::SetFileBox(std::string_view text) { txtfile_->setText(Q(text)); }
+
+void MainWindow::FocusFileBox() { txtfile_->setFocus(); }
+
+void MainWindow::SelectKind(int index) { setKind(index); }
+
+void MainWindow::ShowFolder(std::string_view folder, std::string_view pattern) {
+  const QString path = Q(folder);
+  const int drive = lstdia_->indexOfPath(path);
+  if (drive >= 0) {
+    const QSignalBlocker block(lstdia_);
+    lstdia_->setCurrentIndex(drive);
+  }
+  QString clean = path;
+  while (clean.size() > 1 && clean.endsWith(QDir::separator()) &&
+         !(clean.size() == 3 && clean[1] == QLatin1Char(':'))) {
+    clean.chop(1);
+  }
+  lsttm_->setPath(clean);
+  lstfile_->setPattern(Q(pattern));  // lists the new products too
+  txttm_->setText(ShortFolderText(lsttm_->path()));
+}
+
+}  // namespace kavu::ui

@@ -1,0 +1,129 @@
+// The main window kavu: file choice, options, products, and the computation
+// run with the window as its host.
+#pragma once
+
+#include <QPointer>
+#include <QString>
+#include <functional>
+
+#include "core/host.h"
+#include "core/run.h"
+#include "core/state.h"
+#include "ui/ask.h"
+#include "ui/dialog.h"
+
+class QCheckBox;
+class QComboBox;
+class QLabel;
+class QLineEdit;
+class QListWidgetItem;
+class QPushButton;
+
+namespace kavu::ui {
+
+class DriveList;
+class FileList;
+class FolderList;
+class Nhapsdo;
+class Suasl;
+class Timthay;
+class Xem;
+
+// A check box's state as the settings store keeps it: 0 clear, 1 ticked,
+// 2 grayed.
+int BoxState(const QCheckBox* box);
+
+class MainWindow : public Window, public Host {
+  Q_OBJECT
+ public:
+  // Form_Load: builds the controls and restores the settings.
+  explicit MainWindow(QWidget* parent = nullptr);
+  ~MainWindow() override;
+
+  // Every question of the program's windows goes through this asker.
+  Asker& asker() { return ask_; }
+  // Called once the program is to end (after the settings are written);
+  // quits the application unless replaced.
+  void setEndHook(std::function<void()> hook) { endHook_ = std::move(hook); }
+  // Chooses the common control-point file; empty when cancelled.
+  void setControlFileChooser(std::function<QString()> chooser) {
+    chooseControlFile_ = std::move(chooser);
+  }
+  const RunState& state() const { return st_; }
+  MsgAnswer tbao() const { return tbao_; }
+  const RunResult& lastRun() const { return lastRun_; }
+  bool ending() const { return ending_; }
+
+  Suasl& editor() { return *suasl_; }
+  Xem& viewer() { return *xem_; }
+  Timthay& finder() { return *timthay_; }
+  // The header form, loaded (hidden) when it is not.
+  Nhapsdo& headerForm();
+  bool headerFormLoaded() const { return !nhapsdo_.isNull(); }
+
+  // Handlers.
+  void GhiCaiDat();
+  void cbkieu_Click(int index);
+  void lstdia_Change();
+  void lsttm_Change(const QString& path);
+  void lstfile_Click(QListWidgetItem* item);
+  void lstfile_DblClick(QListWidgetItem* item);
+  void tinh_Click();
+  void fsdo_Click();
+  void KC_Click();
+  void suasolieu_Click();
+  void trogiup_Click();
+  void thoat_Click();
+
+  // Host: what the computation run asks of the window.
+  MsgAnswer MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) override;
+  void SetTitle(std::string_view title) override;
+  void Beep() override;
+  void SetFileBox(std::string_view text) override;
+  void FocusFileBox() override;
+  void SelectKind(int index) override;
+  void ShowFolder(std::string_view folder, std::string_view pattern) override;
+
+ protected:
+  void closeEvent(QCloseEvent* event) override;  // Form_Unload
+
+ private:
+  void buildControls();
+  void Form_Load();
+  void setKind(int index);
+  void setDrive(int index);
+  void collectWindowFields();
+  void writeSettingsOnce();
+  void endProgram();
+
+  RunState st_;
+  RunResult lastRun_;
+  Asker ask_;
+  MsgAnswer tbao_ = MsgAnswer::Ok;
+  std::function<void()> endHook_;
+  std::function<QString()> chooseControlFile_;
+  bool settingsWritten_ = false;
+  bool ending_ = false;
+  bool running_ = false;
+
+  DriveList* lstdia_ = nullptr;
+  FolderList* lsttm_ = nullptr;
+  QLabel* txttm_ = nullptr;
+  QComboBox* cbkieu_ = nullptr;
+  FileList* lstfile_ = nullptr;
+  QLineEdit* txtfile_ = nullptr;
+  QCheckBox *fasc_ = nullptr, *ftd_ = nullptr, *fdc_ = nullptr, *fsdo_ = nullptr;
+  QCheckBox *fdxf_ = nullptr, *fcp_ = nullptr, *fkc_ = nullptr, *ckKC_ = nullptr;
+  QComboBox* TyleTXT_ = nullptr;
+  QLineEdit* Htxt_ = nullptr;
+  QLineEdit* txtSoleDC_ = nullptr;
+  QLineEdit* txtFKC_ = nullptr;
+
+  Timthay* timthay_ = nullptr;
+  Xem* xem_ = nullptr;
+  Suasl* suasl_ = nullptr;
+  QPointer<Nhapsdo> nhapsdo_;
+  QPointer<Window> help_;
+};
+
+}  // namespace kavu::ui

@@ -1,0 +1,83 @@
+// The desktop program's own captions and messages (UTF-8). The engine's texts
+// stay in core/messages.h.
+#pragma once
+
+#include <array>
+#include <string_view>
+
+namespace kavu::ui {
+
+// Names the settings store's application and captions every message box.
+inline constexpr std::string_view kAppTitle = "KAVU";
+inline constexpr std::string_view kSettingsGroup = "Settings";
+
+// Main window.
+inline constexpr std::string_view kMainCaption = "Xử lý số liệu đo toạ độ, độ cao chi tiết";
+inline constexpr std::string_view kTitleLabel = "chương trình tính toạ độ, độ cao điểm chi tiết";
+inline constexpr std::string_view kDrives = "Drivers:";
+inline constexpr std::string_view kDirectory = "Directory:";
+inline constexpr std::string_view kFilesOfType = "List Files of Type: ";
+inline constexpr std::string_view kFile = "File: ";
+inline constexpr std::string_view kOptions = "Lựa chọn";
+inline constexpr std::string_view kMakeAsc = "Tạo File số liệu ASC";
+inline constexpr std::string_view kMakeTxt = "Tạo File toạ độ TXT";
+inline constexpr std::string_view kHeights = "Tính độ cao chi tiết";
+inline constexpr std::string_view kMakeSketch = "Tạo File sổ đo";
+inline constexpr std::string_view kMakeDxf = "Tạo File DXF";
+inline constexpr std::string_view kMakePegs = "Tạo File cọc phụ";
+inline constexpr std::string_view kMakeKc = "Tạo File toạ độ KC";
+inline constexpr std::string_view kScale = "Tỷ lệ BĐ";
+inline constexpr std::string_view kTextHeight = "Htext (mm)";
+inline constexpr std::string_view kHeightDecimals = "Số lẻ ĐC";
+inline constexpr std::string_view kUseCommonKc = "Sử dụng file KC chung";
+inline constexpr std::string_view kKcButton = "File KC";
+inline constexpr std::string_view kCompute = "Tính toạ độ";
+inline constexpr std::string_view kEditData = "Sửa số liệu";
+inline constexpr std::string_view kHelp = "Trợ giúp";
+inline constexpr std::string_view kExit = "Thoát";
+inline constexpr std::array<std::string_view, 9> kScales = {
+    "200", "500", "1000", "2000", "5000", "10000", "25000", "50000", "100000"};
+// The kind list; the spaces line the patterns up in the font of the list.
+inline constexpr std::array<std::string_view, 10> kKinds = {
+    "Số liệu sổ đo                    [*.asc]", "Số liệu FieldBook SDR     [*.sdr]",
+    "Số liệu FieldBook Sokki   [*.obs]",        "Số liệu máy SET               [*.set]",
+    "Số liệu máy Geodimet      [*.raw]",        "Số liệu máy Topcom         [*.idx]",
+    "Số liệu máy Topcom 226  [*.tcm]",          "Số liệu máy LEICA Wid     [*.gre]",
+    "Số liệu máy NIKON           [*.dn7]",      "Số liệu khác                      [*.*]"};
+inline constexpr std::string_view kFileNotFoundShort = "Không tìm thấy File ";
+inline constexpr std::string_view kDataOfFile = "Số liệu của File: ";
+inline constexpr std::string_view kExitQuestion = "Bạn có muốn thoát khỏi chương trình không ?";
+inline constexpr std::string_view kChooseKcFile = "File KC";
+
+// Field-book header form.
+inline constexpr std::string_view kHeaderCaption = "Nhập thông tin về sổ đo";
+inline constexpr std::array<std::string_view, 7> kHeaderLabels = {
+    "Khu đo:", "Lược đồ số:", "Máy đo:", "Số máy: ", "Người đo:", "Người ghi:", "Ngày đo:"};
+inline constexpr std::array<std::string_view, 7> kHeaderDefaults = {
+    "Xã Tân Phú, huyện Đông Sơn", "01", "TOPCOM 226", "23756", "Nguyễn Văn An", "Trần Văn Bình",
+    "Ngày  tháng năm 2003"};
+inline constexpr std::string_view kEnter = "Nhập";
+
+// Editor, viewer, help.
+inline constexpr std::string_view kEditorCaption = "Sữa chữa số liệu";
+inline constexpr std::string_view kViewerCaption =
+    "Trợ giúp chương trình tính toạ độ điểm chi tiết";
+inline constexpr std::string_view kMoreAboutFile = "Thông tin thêm về File: ";
+inline constexpr std::string_view kSave = "Ghi";
+inline constexpr std::string_view kFind = "Tìm";
+inline constexpr std::string_view kViewFile = "Xem File";
+inline constexpr std::string_view kOverwrite = "Có ghi đè lên File số liệu đã có không ?";
+inline constexpr std::string_view kErrPattern = "*.err";
+
+// Find and replace.
+inline constexpr std::string_view kFindCaption = "Tìm kiếm và thay thế";
+inline constexpr std::string_view kFindWhat = "Tìm chuỗi ký tự:";
+inline constexpr std::string_view kReplaceWith = "Chuỗi thay thế:";
+inline constexpr std::string_view kMatchCase = "Phân biệt chữ viết Hoa";
+inline constexpr std::string_view kWholeWord = "Tìm một từ nguyên vẹn";
+inline constexpr std::string_view kFindNext = "Tìm tiếp";
+inline constexpr std::string_view kReplace = "Thay thế";
+inline constexpr std::string_view kReplaceAll = "Thay tất cả";
+inline constexpr std::string_view kNotFoundAgain = "Không tìm thấy! Có tìm tiếp không";
+
+}  // namespace kavu::ui
