@@ -53,22 +53,24 @@ std::string NotFoundMessage(const std::string& path) {
   return std::string(msg::kFileNotFound) + path + "\r" + std::string(msg::kEnterNewFile);
 }
 
-// The converted field book; nothing for kinds without a converter.
-std::optional<std::string> Convert(int kind, std::string_view content) {
+using Converter = std::string (*)(std::string_view content, int kind);
+
+// The converter of a kind; none for the kinds whose field book must exist.
+Converter ConverterOf(int kind) {
   switch (kind) {
     case 1:
     case 7:
-      return ConvertSdr(content, kind);
+      return ConvertSdr;
     case 2:
-      return ConvertObs(content, kind);
+      return ConvertObs;
     case 3:
-      return ConvertSet(content);
+      return [](std::string_view content, int) { return ConvertSet(content); };
     case 5:
-      return ConvertIdx(content);
+      return [](std::string_view content, int) { return ConvertIdx(content); };
     case 6:
-      return ConvertTcm(content);
+      return [](std::string_view content, int) { return ConvertTcm(content); };
     default:
-      return std::nullopt;
+      return nullptr;
   }
 }
 
@@ -101,9 +103,9 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   } else {
     sel.daufile = folderText + name.substr(0, firstDot);
     const std::size_t secondDot = name.find('.', firstDot + 1);
-    sel.duoifile = name.substr(firstDot + 1, secondDot == std::string::npos
-                                                 ? std::string::npos
-                                                 : secondDot - firstDot - 1);
+    sel.duoifile =
+        name.substr(firstDot + 1,
+                    secondDot == std::string::npos ? std::string::npos : secondDot - firstDot - 1);
   }
   // The regenerated field book goes to TRIDO beside the file's folder.
   std::error_code ec;
@@ -118,7 +120,7 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
   // The chosen file.
   if (st.txtfile.empty()) {
     st.filesl.clear();
-    host.MessageBox(msg::kNoFileChosen, MsgIcon::Critical, MsgButtons::Ok);
+    RefuseFile(st, host, msg::kNoFileChosen);
     return std::nullopt;
   }
   std::error_code ec;
@@ -127,8 +129,9 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
     return std::nullopt;
   }
   DeriveFileSelection(st, st.txtfile);
-  const int kind =
-      st.kindOverride >= 0 && st.kindOverride <= 9 ? st.kindOverride : KindOfExtension(Upper(st.duoifile));
+  const int kind = st.kindOverride >= 0 && st.kindOverride <= 9
+                       ? st.kindOverride
+                       : KindOfExtension(Upper(st.duoifile));
   st.cbkieu = kind;
   host.ShowFolder(st.tentm, PatternOfKind(kind));
   host.SelectKind(kind);
@@ -147,26 +150,22 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
   // the one of the same base name for kinds without a converter.
   std::optional<std::string> content;
   const std::string fieldBook = kind == 0 ? st.filesl : st.daufile + ".asc";
-  if (kind == 0) {
-    content = ReadFileBytes(st.filesl);
-  } else {
+  if (const Converter convert = ConverterOf(kind)) {
     const auto raw = ReadFileBytes(st.filesl);
     if (!raw) {
       host.MessageBox(std::string(msg::kCannotOpen) + st.filesl, MsgIcon::Critical, MsgButtons::Ok);
       return std::nullopt;
     }
-    content = Convert(kind, *raw);
-    if (content) {
-      TextOut out(fieldBook);
-      out.Write(*content);
-      if (!out.close()) st.unwritable.push_back(fieldBook);
-    } else {
-      if (!fs::is_regular_file(fieldBook, ec)) {
-        RefuseFile(st, host, NotFoundMessage(fieldBook));
-        return std::nullopt;
-      }
-      content = ReadFileBytes(fieldBook);
+    content = convert(*raw, kind);
+    TextOut out(fieldBook);
+    out.Write(*content);
+    if (!out.close()) st.unwritable.push_back(fieldBook);
+  } else {
+    if (!fs::is_regular_file(fieldBook, ec)) {
+      RefuseFile(st, host, NotFoundMessage(fieldBook));
+      return std::nullopt;
     }
+    content = ReadFileBytes(fieldBook);
   }
   if (!content) {
     host.MessageBox(std::string(msg::kCannotOpen) + fieldBook, MsgIcon::Critical, MsgButtons::Ok);
