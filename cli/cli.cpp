@@ -4,7 +4,6 @@
 #include "cli/cli.h"
 
 #include <CLI/CLI.hpp>
-#include <algorithm>
 #include <array>
 #include <charconv>
 #include <cstdint>
@@ -266,12 +265,8 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   host.ClearProgress();
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
 
-  const std::vector<std::string> lines = SummaryLines(result);
-  for (const std::string& line : lines) out << line << '\n';
-  for (const std::string& path : result.unwritable) {
-    const std::string line = std::string(msg::kCannotWrite) + path;
-    if (std::find(lines.begin(), lines.end(), line) == lines.end()) out << line << '\n';
-  }
+  for (const std::string& line : SummaryLines(result)) out << line << '\n';
+  for (const std::string& path : result.unwritable) out << msg::kCannotWrite << path << '\n';
   out.flush();
   return result.err > 0 || !result.unwritable.empty() ? kExitDataErrors : kExitOk;
 }

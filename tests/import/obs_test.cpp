@@ -36,6 +36,17 @@ TEST(ObsConversion, DetailRecordsHaveTheFieldsTheReaderNeeds) {
   EXPECT_EQ(ConvertObs(file, 3).find("TR"), std::string::npos);
 }
 
+// A reduced distance is rounded with ties to even (0.0625 m at a level sight
+// gives 0.062), while coordinates go through their mask, half away from zero
+// (0.0625 gives .063).
+TEST(ObsConversion, DistancesRoundToEvenCoordinatesHalfAway) {
+  EXPECT_EQ(ConvertObs("08KI             ST1          0.0625          1.0625\r\n"
+                       "09F1                           3          0.0625              90\r\n",
+                       2),
+            "TR ST1          .063        1.063     \r\n"
+            "3             00000    0.062   900000    0.0\r\n");
+}
+
 TEST(ObsConversion, IncompleteBlocksStillEnd) {
   EXPECT_EQ(ConvertObs("02TP             ST1\r\n07TP             ST1", 2),
             "TR ST1          0.0\r\nDKD             \r\n");
