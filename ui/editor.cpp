@@ -3,11 +3,13 @@
 #include <QDir>
 #include <QFile>
 #include <QFileDialog>
+#include <QFileInfo>
 #include <QFontDatabase>
 #include <QGuiApplication>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScreen>
+#include <QTextDocument>
 #include <string>
 
 #include "core/lines.h"
@@ -43,6 +45,11 @@ void Place(QWidget* window, bool rightPart, int buttonHeight) {
   window->move(area.left() + (rightPart ? fifth * 3 : 0), area.top());
 }
 
+// The text box's text as it stands: toPlainText would turn a no-break space
+// (the TCVN3 byte 0xA0) into an ordinary one, so a file saved unchanged would
+// change.
+QString BoxText(const QPlainTextEdit* box) { return box->document()->toRawText(); }
+
 void Tell(const Asker& ask, const QString& path) {
   ask(Q(msg::kCannotWrite) + QDir::toNativeSeparators(path), MsgIcon::Critical, MsgButtons::Ok);
 }
@@ -60,6 +67,7 @@ QString DecodeForScreen(const QByteArray& bytes) {
 QByteArray EncodeForFile(const QString& text) {
   QString lines = text;
   lines.replace(QChar::ParagraphSeparator, QLatin1Char('\n'));
+  lines.replace(QChar::LineSeparator, QLatin1Char('\n'));
   lines.replace(QLatin1Char('\n'), QStringLiteral("\r\n"));
   if (!lines.endsWith(QStringLiteral("\r\n"))) lines += QStringLiteral("\r\n");
   const QByteArray utf8 = lines.toUtf8();
@@ -67,11 +75,15 @@ QByteArray EncodeForFile(const QString& text) {
   return QByteArray(bytes.data(), static_cast<qsizetype>(bytes.size()));
 }
 
-bool SaveWithBackup(const Asker& ask, const QString& target, const QString& backup,
+bool SaveWithBackup(const Asker& ask, const QString& target, const QString& wantedBackup,
                     const QString& text) {
   if (ask(Q(kOverwrite), MsgIcon::Question, MsgButtons::YesNo, true) != MsgAnswer::Yes) {
     return false;
   }
+  // A backup named like the file itself ("job1.bak" opened in the editor)
+  // would delete the very content it is to keep: it takes the whole name then.
+  const QString backup =
+      QFileInfo(wantedBackup) == QFileInfo(target) ? target + QStringLiteral(".bak") : wantedBackup;
   const QString scratch = target + QStringLiteral(".kavu-new");
   {
     QFile out(scratch);
@@ -112,8 +124,8 @@ Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
   txtxem_ = MakeTextBox(this, "txtxem");
   ghixem_ = MakeButton(this, "ghixem", Q(kSave));
   timxem_ = MakeButton(this, "Timxem", Q(kFind));
+  // No cancel button: Esc must not close the viewer and drop its edits.
   thoat_ = MakeButton(this, "thoat", Q(kExit));
-  setCancelButton(thoat_);
   Place(this, false, thoat_->sizeHint().height());
   connect(ghixem_, &QPushButton::clicked, this, &Xem::ghixem_Click);
   connect(timxem_, &QPushButton::clicked, this, &Xem::Timxem_Click);
@@ -132,7 +144,7 @@ void Xem::ghixem_Click() {
   if (file_.isEmpty()) return;
   // The backup keeps the whole name, so a report's backup never replaces the
   // field book's "name.bak".
-  SaveWithBackup(ask_, file_, file_ + QStringLiteral(".bak"), txtxem_->toPlainText());
+  SaveWithBackup(ask_, file_, file_ + QStringLiteral(".bak"), BoxText(txtxem_));
 }
 
 void Xem::Timxem_Click() { finder_.open(2); }
@@ -191,7 +203,7 @@ void Suasl::openFile(const QString& filesl, const QString& daufile, const QStrin
 
 void Suasl::ghi_Click() {
   if (filesl_.isEmpty()) return;
-  SaveWithBackup(ask_, filesl_, daufile_ + QStringLiteral(".bak"), txtsuasl_->toPlainText());
+  SaveWithBackup(ask_, filesl_, daufile_ + QStringLiteral(".bak"), BoxText(txtsuasl_));
 }
 
 void Suasl::timkiem_Click() { finder_.open(1); }

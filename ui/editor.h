@@ -22,10 +22,11 @@ QString DecodeForScreen(const QByteArray& bytes);
 // break is added only when the text does not end with one.
 QByteArray EncodeForFile(const QString& text);
 
-// Asks, then keeps the old content of target as backup and writes text over
-// target. The new text goes to a scratch file first, so a failing write or
-// rename leaves the original or its backup in place; the user is told. True
-// when the text was saved.
+// Asks, then keeps the old content of target as backup (as target + ".bak"
+// when backup names target itself) and writes text over target. The new text
+// goes to a scratch file first, so a failing write or rename leaves the
+// original or its backup in place; the user is told. True when the text was
+// saved.
 bool SaveWithBackup(const Asker& ask, const QString& target, const QString& backup,
                     const QString& text);
 

@@ -469,6 +469,12 @@ void MainWindow::endProgram() {
 }
 
 void MainWindow::closeEvent(QCloseEvent* event) {
+  // The run does not give way to the window until its summary; a request to
+  // close that arrives while it redraws the title is refused.
+  if (running_) {
+    event->ignore();
+    return;
+  }
   writeSettingsOnce();
   event->accept();
   if (!ending_) endProgram();

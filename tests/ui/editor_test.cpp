@@ -95,6 +95,37 @@ class EditorTest : public QObject {
     QCOMPARE(editor.txtsuasl()->toPlainText(), QStringLiteral("gone"));
   }
 
+  void everyByteSurvivesASaveUnchanged() {
+    // Every byte but the line ends (0xA0, the no-break space, among them),
+    // through the real text boxes and back.
+    QByteArray bytes;
+    for (int b = 1; b < 256; ++b) {
+      if (b != '\r' && b != '\n') bytes.append(static_cast<char>(b));
+      if (b % 32 == 0) bytes.append("\r\n");
+    }
+    bytes.append("\r\n");
+    QTemporaryDir work;
+    WriteAll(work.filePath("all.asc"), bytes);
+    WriteAll(work.filePath("all.err"), bytes);
+    Person person;
+    MainWindow w;
+    w.asker().setHook(person.hook());
+    OpenInEditor(w, work.path(), QStringLiteral("all.asc"));
+    Child<QPushButton>(w.editor(), "ghi")->click();
+    QCOMPARE(ReadAll(work.filePath("all.asc")), bytes);
+    w.editor().setChooser([&](const QString&, const QString&) { return work.filePath("all.err"); });
+    Child<QPushButton>(w.editor(), "xemfile")->click();
+    Child<QPushButton>(w.viewer(), "ghixem")->click();
+    QCOMPARE(ReadAll(work.filePath("all.err")), bytes);
+    // A line break typed as Shift+Enter is an ordinary line end in the file.
+    w.viewer().txtxem()->setPlainText(QStringLiteral("a"));
+    w.viewer().txtxem()->moveCursor(QTextCursor::End);
+    QTest::keyClick(w.viewer().txtxem(), Qt::Key_Return, Qt::ShiftModifier);
+    QTest::keyClicks(w.viewer().txtxem(), QStringLiteral("b"));
+    Child<QPushButton>(w.viewer(), "ghixem")->click();
+    QCOMPARE(ReadAll(work.filePath("all.err")), QByteArray("a\r\nb\r\n"));
+  }
+
   void theEditorSavesTheFileItOpened() {
     QTemporaryDir work;
     WriteAll(work.filePath("job1.asc"), "one\r\n");
@@ -139,6 +170,21 @@ class EditorTest : public QObject {
     QCOMPARE(ReadAll(work.filePath("job1.err")), QByteArray("report read\r\n"));
     QCOMPARE(ReadAll(work.filePath("job1.err.bak")), QByteArray("report\r\n"));
     QCOMPARE(ReadAll(work.filePath("job1.bak")), QByteArray("editor backup\r\n"));
+  }
+
+  void aBackupOpenedInTheEditorKeepsItsOldContent() {
+    // "job1.bak" itself edited: its backup base "job1" + ".bak" is the file.
+    QTemporaryDir work;
+    WriteAll(work.filePath("job1.bak"), "old\r\n");
+    Person person;
+    MainWindow w;
+    w.asker().setHook(person.hook());
+    w.SelectKind(9);
+    OpenInEditor(w, work.path(), QStringLiteral("job1.bak"));
+    w.editor().txtsuasl()->setPlainText(QStringLiteral("new"));
+    Child<QPushButton>(w.editor(), "ghi")->click();
+    QCOMPARE(ReadAll(work.filePath("job1.bak")), QByteArray("new\r\n"));
+    QCOMPARE(ReadAll(work.filePath("job1.bak.bak")), QByteArray("old\r\n"));
   }
 
   void cancellingTheViewDialogLeavesTheViewerClosed() {
@@ -192,6 +238,8 @@ class EditorTest : public QObject {
     QTest::keyClick(&w.editor(), Qt::Key_Escape);  // thoat is the editor's cancel button
     QVERIFY(!w.editor().isVisible());
     w.viewer().show();
+    QTest::keyClick(w.viewer().txtxem(), Qt::Key_Escape);  // the viewer has no cancel button
+    QVERIFY(w.viewer().isVisible());
     Child<QPushButton>(w.viewer(), "thoat")->click();
     QVERIFY(!w.viewer().isVisible());
     Child<QPushButton>(w.editor(), "timkiem")->click();

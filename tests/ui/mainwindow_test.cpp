@@ -153,6 +153,27 @@ class MainWindowTest : public QObject {
     QCOMPARE(Stored("KAVU_TyleTXT"), QStringLiteral("500"));
   }
 
+  void aRunIsNotClosedUnderway() {
+    QTemporaryDir work;
+    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));
+    Person person;
+    MainWindow w;
+    w.asker().setHook(person.hook());
+    bool ended = false;
+    w.setEndHook([&ended] { ended = true; });
+    w.show();
+    // The close box pressed while the title shows the first station.
+    connect(&w, &QWidget::windowTitleChanged, &w, [&w](const QString& title) {
+      if (title.startsWith(Q(msg::kStationTitle))) w.close();
+    });
+    w.SetFileBox(Native(work.filePath("job1.asc")).toStdString());
+    w.tinh_Click();
+    QCOMPARE(person.asked.size(), 1u);  // the summary, answered Yes
+    QVERIFY(!ended);
+    QVERIFY(w.isVisible());
+    QVERIFY(!IsStored("KAVU_Ftd"));
+  }
+
   void theFieldSketchTakesTheStoredHeaderTexts() {
     QTemporaryDir work;
     QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));

@@ -62,7 +62,7 @@ class SettingsTest : public QObject {
     {
       MainWindow w;
       w.setEndHook([] {});
-      Child<QLineEdit>(w, "txtFKC")->setText(QStringLiteral("/data/kc chung.txt"));
+      Child<QLineEdit>(w, "txtFKC")->setText(QStringLiteral("/data/kc, chung.txt"));
       Child<QCheckBox>(w, "ckKC")->setCheckState(Qt::Checked);
       w.SelectKind(5);
       Child<FolderList>(w, "lsttm")->setPath(path);
@@ -80,7 +80,7 @@ class SettingsTest : public QObject {
       w.close();
     }
     const std::vector<std::pair<const char*, QString>> expected = {
-        {"KAVU_txtFKC", QStringLiteral("/data/kc chung.txt")},
+        {"KAVU_txtFKC", QStringLiteral("/data/kc, chung.txt")},
         {"KAVU_ckKC", QStringLiteral("1")},
         {"KAVU_cbkieu", QStringLiteral("5")},
         {"KAVU_LstTM", path},
@@ -97,7 +97,7 @@ class SettingsTest : public QObject {
     QVERIFY(!IsStored("KAVU_Fsdo"));
 
     MainWindow again;
-    QCOMPARE(Child<QLineEdit>(again, "txtFKC")->text(), QStringLiteral("/data/kc chung.txt"));
+    QCOMPARE(Child<QLineEdit>(again, "txtFKC")->text(), QStringLiteral("/data/kc, chung.txt"));
     QCOMPARE(Child<QCheckBox>(again, "ckKC")->checkState(), Qt::Checked);
     QCOMPARE(Child<QComboBox>(again, "cbkieu")->currentIndex(), 5);
     QCOMPARE(Child<FileList>(again, "lstfile")->pattern(), QStringLiteral("*.idx"));
