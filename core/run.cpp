@@ -183,7 +183,8 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     st.ccm = FieldOf(st, 2);
     st.DongTram = st.TenKC.str();
     if (st.stp == 2) {
-      ReportError(st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
+      ReportError(
+          st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
     }
     TimToaDoDiem(st);
     st.TenTram = st.TenKC.str();
@@ -202,8 +203,8 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     }
   } else {
     st.I = 0;
-    ReportError(st, std::string(msg::kPointColon) + copy.Field0() +
-                        Utf8ToTcvn3(msg::kStationRunTogether));
+    ReportError(
+        st, std::string(msg::kPointColon) + copy.Field0() + Utf8ToTcvn3(msg::kStationRunTogether));
   }
 
   copy.ReadLine();

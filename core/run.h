@@ -21,7 +21,7 @@ struct RunResult {
   int stations = 0;
   long long bodyRecords = 0;
   std::int32_t err = 0;
-  std::string startTime, endTime;      // HH:MM:SS
+  std::string startTime, endTime;       // HH:MM:SS
   std::vector<std::string> unwritable;  // products that could not be written
   MsgAnswer answer = MsgAnswer::Ok;     // the answer to the closing question
 };

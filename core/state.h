@@ -21,16 +21,16 @@ inline bool Ticked(int state) { return state == 1; }
 
 // The values of the main window's controls that the run reads or sets.
 struct WindowFields {
-  std::string txtfile;  // the chosen file's path, native
-  int cbkieu = 0;       // kind of input, 0 to 9
-  int fasc = 0;         // regenerated field book and companion file
-  int ftd = 1;          // coordinate text file
-  int fdc = 1;          // detail heights
-  int fsdo = 2;         // field sketch (grayed until clicked)
-  int fdxf = 2;         // drawing file (grayed until clicked)
-  int fcp = 0;          // auxiliary-peg file
-  int fkc = 0;          // control-coordinate file
-  int ckKC = 0;         // control points from the common file
+  std::string txtfile;           // the chosen file's path, native
+  int cbkieu = 0;                // kind of input, 0 to 9
+  int fasc = 0;                  // regenerated field book and companion file
+  int ftd = 1;                   // coordinate text file
+  int fdc = 1;                   // detail heights
+  int fsdo = 2;                  // field sketch (grayed until clicked)
+  int fdxf = 2;                  // drawing file (grayed until clicked)
+  int fcp = 0;                   // auxiliary-peg file
+  int fkc = 0;                   // control-coordinate file
+  int ckKC = 0;                  // control points from the common file
   std::string TyleTXT = "1000";  // map scale denominator, as typed
   std::string Htxt = "2.0";      // label height in mm, as typed
   std::string txtSoleDC = "2";   // decimals of heights, as typed

@@ -157,9 +157,10 @@ void STP6(RunState& st) {
     // An orientation distance record: only the distance counts.
     st.s = Val(Field(st, 2));
     if (st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
-      ReportError(st, std::string(msg::kStation) + st.TenTram.str() + Utf8ToTcvn3(msg::kOrientation) +
-                          st.TenDinhHuong.str() + std::string(msg::kWrongOrientationDistance) +
-                          std::string(msg::kDS) + ReportNumber(RoundEven(st.s - st.cdhdau, 2)));
+      ReportError(st, std::string(msg::kStation) + st.TenTram.str() +
+                          Utf8ToTcvn3(msg::kOrientation) + st.TenDinhHuong.str() +
+                          std::string(msg::kWrongOrientationDistance) + std::string(msg::kDS) +
+                          ReportNumber(RoundEven(st.s - st.cdhdau, 2)));
     }
     return;
   }
@@ -176,8 +177,8 @@ void STP6(RunState& st) {
   std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
   if (st.stp > 6) line += " " + Field(st, 6);
   st.ChuoiKC += line + "\r\n";
-  st.MangCocPhu.push_back({"", Field(st, 5), Field(st, 1), Field(st, 2), Field(st, 3),
-                           Field(st, 4), st.stp > 6 ? Field(st, 6) : std::string()});
+  st.MangCocPhu.push_back({"", Field(st, 5), Field(st, 1), Field(st, 2), Field(st, 3), Field(st, 4),
+                           st.stp > 6 ? Field(st, 6) : std::string()});
 }
 
 void STP7(RunState& st) {

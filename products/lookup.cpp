@@ -8,8 +8,8 @@
 
 namespace kavu {
 
-std::string ControlLine(const std::string& name12, const std::string& x11,
-                        const std::string& y10, const std::string* z10) {
+std::string ControlLine(const std::string& name12, const std::string& x11, const std::string& y10,
+                        const std::string* z10) {
   std::string line = "TR " + name12;
   // A name that fills its columns would run into X and read back wrongly.
   if (!name12.empty() && name12.back() != ' ') line += ' ';
@@ -78,7 +78,8 @@ void TimToaDoDiem(RunState& st) {
   }
   if (st.n == 0) {
     st.I = 0;
-    ReportError(st, std::string(msg::kPointColon) + st.TenKC.str() + std::string(msg::kNoCoordinates));
+    ReportError(st,
+                std::string(msg::kPointColon) + st.TenKC.str() + std::string(msg::kNoCoordinates));
   }
 }
 

@@ -12,7 +12,7 @@ void TimToaDoDiem(RunState& st);
 
 // A control-coordinate line of ChuoiKC: "TR " + name + X + " " + Y
 // (+ " " + H), with one space after a name that fills its 12 columns.
-std::string ControlLine(const std::string& name12, const std::string& x11,
-                        const std::string& y10, const std::string* z10);
+std::string ControlLine(const std::string& name12, const std::string& x11, const std::string& y10,
+                        const std::string* z10);
 
 }  // namespace kavu

@@ -51,8 +51,8 @@ void GhiMangSoLieuVaoSoDo(RunState& st) {
       if (st.stp == 7) note += " " + Field(st, 6);
     }
   }
-  st.MangSoLieuSoDo.push_back({st.TenDiem.str(), st.StGoc, st.StS.str(), GocSt1(st.GocD),
-                               PrismText(st.ccg), note});
+  st.MangSoLieuSoDo.push_back(
+      {st.TenDiem.str(), st.StGoc, st.StS.str(), GocSt1(st.GocD), PrismText(st.ccg), note});
 }
 
 }  // namespace kavu

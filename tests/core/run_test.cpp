@@ -89,8 +89,9 @@ TEST(Run, RegeneratedFieldBookComputesToTheSameCoordinates) {
 
 TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
   const fs::path folder = FreshFolder();
-  WriteBytes(folder / "job.asc",
-             "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
+  WriteBytes(
+      folder / "job.asc",
+      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
   WriteBytes(folder / "job.bak", "old\r\n");
   RunState st = StateFor(folder / "job.asc");
   RecordingHost host;
@@ -114,8 +115,9 @@ TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
   RunState missing = StateFor(folder / "nothing.asc");
   host.fileBox = "x";
   EXPECT_EQ(tinh_Click(missing, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) + (folder / "nothing.asc").string() +
-                                      "\r" + std::string(msg::kEnterNewFile));
+  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) +
+                                      (folder / "nothing.asc").string() + "\r" +
+                                      std::string(msg::kEnterNewFile));
   EXPECT_EQ(host.fileBox, "");
   EXPECT_EQ(missing.txtfile, "");
 
@@ -171,8 +173,9 @@ TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
 TEST(Run, UnwritableProductIsNamedAndTheOthersAreWritten) {
   const fs::path folder = FreshFolder();
   fs::create_directories(folder / "data");
-  WriteBytes(folder / "data" / "job.asc",
-             "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
+  WriteBytes(
+      folder / "data" / "job.asc",
+      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
   WriteBytes(folder / "TRIDO", "a file where the folder should be");
   RunState st = StateFor(folder / "data" / "job.asc");
   st.fasc = st.ftd = 1;
@@ -193,10 +196,10 @@ TEST(Run, HostileBytesEndWithASummary) {
   std::string binary;
   for (int i = 0; i < 4096; ++i) binary += static_cast<char>((i * 131 + 7) % 256);
   const std::string cases[] = {
-      head + "1 900000 100 900000 1.5",                                // no final line end
-      head + std::string("1 9\0 100 900000 1.5\r\n", 21),              // NUL inside a number
-      head + "2 0 1 90 1 " + std::string(10'000'000, 'x') + "\r\n",    // a 10 MB word
-      head + binary,                                                   // binary data
+      head + "1 900000 100 900000 1.5",                              // no final line end
+      head + std::string("1 9\0 100 900000 1.5\r\n", 21),            // NUL inside a number
+      head + "2 0 1 90 1 " + std::string(10'000'000, 'x') + "\r\n",  // a 10 MB word
+      head + binary,                                                 // binary data
       head + "\xa7\x81\xff 0 1 900000 1 \x80\r\n1e999 1e999 1e999 1e999 1e999\r\n",
       head + "TR 1e308 1e308 1e308 1e308\r\nTR 1e308 1.5\r\nDKD B\r\n3 1e300 1e300 1e300 1\r\n",
   };

@@ -70,8 +70,11 @@ TEST(TinhPhuongViCanh, SinglePrecisionAzimuthsAndDistance) {
   f.st.yTR = 1000;
   const struct {
     double x, y, gpv;
-  } cases[] = {{900, 1000, 0}, {1000, 900, 90.0000025}, {1000, 1100, 270.0000007},
-               {1100, 1000, 180.000005}, {900, 900, 45.0000013}};
+  } cases[] = {{900, 1000, 0},
+               {1000, 900, 90.0000025},
+               {1000, 1100, 270.0000007},
+               {1100, 1000, 180.000005},
+               {900, 900, 45.0000013}};
   for (const auto& c : cases) {
     f.st.xDKD = c.x;
     f.st.yDKD = c.y;

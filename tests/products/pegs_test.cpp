@@ -126,15 +126,15 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   const auto folder = FreshFolder();
   const auto book = folder / "JOB1.asc";
   testing::WriteBytes(book,
-            "TR ST1 2345678.123 567890.456 12.5\r\n"
-            "TR DH1 2345578.123 567890.456 10.0\r\n"
-            "TR ST1 1.45\r\n"
-            "DKD DH1\r\n"
-            "1 1234530 45.6 900000 1.5\r\n"
-            "2 2700000 30.25 900000 1.5 CP5\r\n"
-            "TR CP5 1.5\r\n"
-            "DKD ST1\r\n"
-            "3 1800000 20 900000 1.5\r\n");
+                      "TR ST1 2345678.123 567890.456 12.5\r\n"
+                      "TR DH1 2345578.123 567890.456 10.0\r\n"
+                      "TR ST1 1.45\r\n"
+                      "DKD DH1\r\n"
+                      "1 1234530 45.6 900000 1.5\r\n"
+                      "2 2700000 30.25 900000 1.5 CP5\r\n"
+                      "TR CP5 1.5\r\n"
+                      "DKD ST1\r\n"
+                      "3 1800000 20 900000 1.5\r\n");
   QuietHost host;
   RunState first = RunOn(book);
   ASSERT_EQ(tinh_Click(first, host).outcome, RunOutcome::Completed);
