@@ -1,12 +1,15 @@
 // Pieces shared by the converters of fixed-column instrument files: column
 // access that never reads past a line, the record code, the reduction of a
-// slope distance, readings turned to the backsight, and the column texts of a
-// detail record.
+// slope distance, readings turned to the backsight, the observations that wait
+// for their backsight, and the column texts of a detail record.
 #pragma once
 
 #include <cstddef>
+#include <functional>
 #include <string>
 #include <string_view>
+#include <utility>
+#include <vector>
 
 namespace kavu {
 
@@ -31,6 +34,37 @@ double HorizontalDistance(double slope, double zenith_degrees);
 // happens while no backsight reading is known (0); a negative difference gets
 // 360 added once.
 double TurnReading(double reading, double backsight_reading);
+
+// Observations shot after a set-up's backsight record but before the
+// backsight itself was read. They were read on the same circle, so they wait
+// for the backsight reading and are then written turned like the rest; a
+// set-up that ends without it releases them with their circle readings.
+template <typename Observation>
+class HeldObservations {
+ public:
+  explicit HeldObservations(std::function<void(const Observation&)> write)
+      : write_(std::move(write)) {}
+  // The writer is bound to its owner: never copied with it.
+  HeldObservations(const HeldObservations&) = delete;
+  HeldObservations& operator=(const HeldObservations&) = delete;
+
+  // A backsight record was read: observations wait until it is observed.
+  void Await() { awaiting_ = true; }
+  bool awaiting() const { return awaiting_; }
+  void Hold(Observation observation) { held_.push_back(std::move(observation)); }
+
+  // Writes the held observations in file order and stops waiting.
+  void Release() {
+    for (const Observation& observation : held_) write_(observation);
+    held_.clear();
+    awaiting_ = false;
+  }
+
+ private:
+  std::function<void(const Observation&)> write_;
+  bool awaiting_ = false;
+  std::vector<Observation> held_;
+};
 
 // A computed horizontal distance in its 9 columns ("####0.000").
 std::string DistanceText(double distance);

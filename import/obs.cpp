@@ -47,7 +47,7 @@ class ObsWriter {
       AppendLine(out_, "DKD " + backsight_label_);
       reference_ = 0;
       have_backsight_ = true;
-      awaiting_backsight_ = true;
+      held_.Await();
     } else if (code == "03NM") {
       prism_height_ = Trim(Columns(line, 5, 20));
       if (prism_height_.empty()) prism_height_ = "0.0";
@@ -72,14 +72,11 @@ class ObsWriter {
     // longer than its 10-character column still finds its backsight.
     if (have_backsight_ && TrimView(FixedWidth(obs.target, 12)) == TrimView(backsight_label_)) {
       reference_ = obs.reading;
-      if (awaiting_backsight_) {
-        // Points shot before the backsight, on the same circle: turned too.
-        for (const Observation& held : held_) Write(held);
-        held_.clear();
-        awaiting_backsight_ = false;
-      }
-    } else if (awaiting_backsight_) {
-      held_.push_back(std::move(obs));
+      // The orientation record went out with the backsight record; only the
+      // points held for the backsight follow.
+      held_.Release();
+    } else if (held_.awaiting()) {
+      held_.Hold(std::move(obs));
       return;
     }
     Write(obs);
@@ -87,11 +84,7 @@ class ObsWriter {
 
   // A set-up whose backsight was never observed: its points keep their
   // circle readings.
-  void CloseOrientation() {
-    for (const Observation& held : held_) Write(held);
-    held_.clear();
-    awaiting_backsight_ = false;
-  }
+  void CloseOrientation() { held_.Release(); }
 
   void Write(const Observation& obs) {
     std::string distance = DistanceText(obs.distance);
@@ -112,10 +105,9 @@ class ObsWriter {
   std::string instrument_height_ = "0.0";
   std::string backsight_label_;
   bool have_backsight_ = false;
-  bool awaiting_backsight_ = false;
   double reference_ = 0;
   std::string prism_height_ = "0.0";
-  std::vector<Observation> held_;
+  HeldObservations<Observation> held_{[this](const Observation& obs) { Write(obs); }};
 };
 
 }  // namespace

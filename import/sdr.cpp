@@ -98,7 +98,7 @@ class SdrWriter {
     }
     reference_ = 0;
     have_backsight_ = true;
-    awaiting_backsight_ = true;
+    held_.Await();
   }
 
   void Observe(std::string_view line) {
@@ -120,17 +120,12 @@ class SdrWriter {
     if (have_backsight_ && id == backsight_id_) {
       reference_ = obs.reading;
       if (!backsight_found_ && note.size() > 2) backsight_label_ = FixedWidth(note, 12);
+      // Every reading of the backsight writes its orientation record; the
+      // points held for it follow.
       AppendLine(out_, "DKD " + Trim(backsight_label_));
-      if (awaiting_backsight_) {
-        // Points shot between the backsight record and the backsight itself
-        // were read on the same circle: they follow the orientation record,
-        // turned like the rest.
-        for (const Observation& held : held_) Write(held);
-        held_.clear();
-        awaiting_backsight_ = false;
-      }
-    } else if (awaiting_backsight_) {
-      held_.push_back(std::move(obs));
+      held_.Release();
+    } else if (held_.awaiting()) {
+      held_.Hold(std::move(obs));
       return;
     }
     Write(obs);
@@ -139,11 +134,9 @@ class SdrWriter {
   // A set-up whose backsight was never observed still gets its orientation
   // record, and its points keep their circle readings.
   void CloseOrientation() {
-    if (!awaiting_backsight_) return;
+    if (!held_.awaiting()) return;
     AppendLine(out_, "DKD " + Trim(backsight_label_));
-    for (const Observation& held : held_) Write(held);
-    held_.clear();
-    awaiting_backsight_ = false;
+    held_.Release();
   }
 
   void Write(const Observation& obs) {
@@ -162,11 +155,10 @@ class SdrWriter {
   std::string backsight_id_;
   std::string backsight_label_;
   bool backsight_found_ = false;
-  bool have_backsight_ = false;      // no observation is the backsight before one is named
-  bool awaiting_backsight_ = false;  // backsight record written, backsight not yet observed
+  bool have_backsight_ = false;  // no observation is the backsight before one is named
   double reference_ = 0;
   std::string target_height_;  // empty until the first "03NM"
-  std::vector<Observation> held_;
+  HeldObservations<Observation> held_{[this](const Observation& obs) { Write(obs); }};
 };
 
 }  // namespace

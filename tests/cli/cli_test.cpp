@@ -5,12 +5,10 @@
 
 #include <gtest/gtest.h>
 #include <sys/wait.h>
-#include <unistd.h>
 
 #include <charconv>
 #include <cstdlib>
 #include <filesystem>
-#include <fstream>
 #include <map>
 #include <regex>
 #include <sstream>
@@ -22,6 +20,7 @@
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
+#include "tests/support.h"
 
 namespace kavu {
 namespace {
@@ -33,42 +32,9 @@ struct Outcome {
   std::string out, err;
 };
 
-// A fresh folder per test, removed afterwards.
-class TempDir {
- public:
-  explicit TempDir(std::string_view tag = "") {
-    const auto* info = ::testing::UnitTest::GetInstance()->current_test_info();
-    path_ = fs::temp_directory_path() /
-            ("kavu-cli-" + std::string(info->test_suite_name()) + "-" + info->name() + "-" +
-             std::to_string(::getpid()) + std::string(tag));
-    fs::remove_all(path_);
-    fs::create_directories(path_);
-  }
-  ~TempDir() {
-    std::error_code ec;
-    fs::remove_all(path_, ec);
-  }
-  const fs::path& path() const { return path_; }
-  fs::path operator/(std::string_view name) const { return path_ / name; }
-
- private:
-  fs::path path_;
-};
-
-void WriteBytes(const fs::path& path, std::string_view bytes) {
-  fs::create_directories(path.parent_path());
-  std::ofstream out(path, std::ios::binary);
-  out.write(bytes.data(), static_cast<std::streamsize>(bytes.size()));
-}
-
-std::string Bytes(const fs::path& path) { return ReadFileBytes(path).value_or("<missing>"); }
-
-std::vector<std::string> OutLines(const std::string& text) {
-  std::vector<std::string> lines;
-  std::istringstream in(text);
-  for (std::string line; std::getline(in, line);) lines.push_back(line);
-  return lines;
-}
+using testing::FileBytes;
+using testing::FreshFolder;
+using testing::WriteBytes;
 
 Outcome Cli(const std::vector<std::string>& args, bool terminal = false) {
   const std::vector<std::string_view> views(args.begin(), args.end());
@@ -87,7 +53,7 @@ std::string Quote(const std::string& s) {
 }
 
 // Runs the executable itself, so that main's wiring is covered too.
-Outcome Exe(const std::vector<std::string>& args, const TempDir& dir) {
+Outcome Exe(const std::vector<std::string>& args, const fs::path& dir) {
   std::string command = Quote(KAVU_CLI_EXE);
   for (const std::string& a : args) command += " " + Quote(a);
   command += " <" + Quote("/dev/null") + " >" + Quote((dir / "stdout").string()) + " 2>" +
@@ -95,8 +61,8 @@ Outcome Exe(const std::vector<std::string>& args, const TempDir& dir) {
   const int status = std::system(command.c_str());
   Outcome o;
   o.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-  o.out = Bytes(dir / "stdout");
-  o.err = Bytes(dir / "stderr");
+  o.out = FileBytes(dir / "stdout");
+  o.err = FileBytes(dir / "stderr");
   return o;
 }
 
@@ -114,7 +80,7 @@ std::vector<std::string> Words(std::string_view line) {
 }
 
 // One station on two known points: a detail point 50 m due east of DC01.
-constexpr std::string_view kSmallBook =
+constexpr char kSmallBook[] =
     "TR DC01 1000.000 2000.000 10.000\r\n"
     "TR DC02 1100.000 2000.000 10.000\r\n"
     "TR DC01 1.50\r\n"
@@ -125,7 +91,7 @@ constexpr std::string_view kSmallBook =
 const std::regex kTime("[0-2][0-9]:[0-5][0-9]:[0-5][0-9]");
 
 void ExpectSummary(const Outcome& o, int stations, int points, int errors) {
-  const std::vector<std::string> lines = OutLines(o.out);
+  const std::vector<std::string> lines = SplitLines(o.out);
   ASSERT_GE(lines.size(), 5u) << o.out;
   EXPECT_EQ(lines[0], std::string(msg::kTotalStations) + " " + std::to_string(stations));
   EXPECT_EQ(lines[1], std::string(msg::kTotalPoints) + " " + std::to_string(points));
@@ -137,7 +103,7 @@ void ExpectSummary(const Outcome& o, int stations, int points, int errors) {
 }
 
 TEST(CliUsage, BadCommandLinesExit64WithoutRunning) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   const std::string book = (dir / "a.asc").string();
   WriteBytes(book, kSmallBook);
   const std::vector<std::vector<std::string>> bad = {
@@ -158,73 +124,52 @@ TEST(CliUsage, BadCommandLinesExit64WithoutRunning) {
     EXPECT_NE(o.err.find("--help"), std::string::npos) << o.err;
   }
   // None of them ran: no report, no product.
-  EXPECT_EQ(std::distance(fs::directory_iterator(dir.path()), fs::directory_iterator{}), 1);
+  EXPECT_EQ(std::distance(fs::directory_iterator(dir), fs::directory_iterator{}), 1);
 }
 
 TEST(CliUsage, HelpNamesEveryOptionAndExitCode) {
   const Outcome o = Cli({"--help"});
   EXPECT_EQ(o.code, kExitOk);
-  for (const char* word : {"--kind",
-                           "--scale",
-                           "--text-height",
-                           "--height-decimals",
-                           "--asc",
-                           "--txt",
-                           "--sketch",
-                           "--dxf",
-                           "--pegs",
-                           "--kc",
-                           "--all",
-                           "--heights",
-                           "--no-heights",
-                           "--control-file",
-                           "--seed",
-                           "--area",
-                           "--sketch-no",
-                           "--instrument",
-                           "--instrument-no",
-                           "--surveyor",
-                           "--recorder",
-                           "--date",
-                           "Exit status",
-                           "  64 ",
-                           "  2 ",
-                           "Không ghi được File: "}) {
+  std::string words =
+      "--kind --scale --text-height --height-decimals --asc --txt --sketch --dxf --pegs --kc "
+      "--all --heights --no-heights --control-file --seed --area --sketch-no --instrument "
+      "--instrument-no --surveyor --recorder --date";
+  std::vector<std::string> expected = SplitFields(words);
+  expected.insert(expected.end(), {"Exit status", "  64 ", "  2 ", "Không ghi được File: "});
+  for (const std::string& word : expected) {
     EXPECT_NE(o.out.find(word), std::string::npos) << word;
   }
   EXPECT_TRUE(o.err.empty());
 }
 
-TEST(CliExe, MissingFileExits2WithTheMessageOnStderr) {
-  TempDir dir;
-  const std::string path = (dir / "nothere.asc").string();
-  const Outcome o = Exe({"--all", path}, dir);
-  EXPECT_EQ(o.code, kExitStopped);
-  EXPECT_EQ(o.out, "");
-  // The two-line message box: its lone CR becomes a line feed.
-  EXPECT_EQ(o.err,
-            std::string(msg::kFileNotFound) + path + "\n" + std::string(msg::kEnterNewFile) + "\n");
-  EXPECT_FALSE(fs::exists(dir / "nothere.err"));
-}
-
-TEST(CliExe, EmptyFileExits2) {
-  TempDir dir;
+// A missing or empty field book stops before the run: the two-line message
+// box on stderr (its lone CR becomes a line feed), and no report.
+TEST(CliExe, MissingOrEmptyFileExits2WithTheMessageOnStderr) {
+  const fs::path dir = FreshFolder();
   WriteBytes(dir / "empty.asc", "");
-  const Outcome o = Exe({(dir / "empty.asc").string()}, dir);
-  EXPECT_EQ(o.code, kExitStopped);
-  EXPECT_EQ(o.out, "");
-  EXPECT_EQ(o.err,
-            std::string(msg::kFileSizeZero) + "\n" + std::string(msg::kCheckFileAgain) + "\n");
+  const std::string missing = (dir / "nothere.asc").string();
+  const std::vector<std::pair<std::string, std::string>> cases = {
+      {missing, std::string(msg::kFileNotFound) + missing + "\n" + std::string(msg::kEnterNewFile)},
+      {(dir / "empty.asc").string(),
+       std::string(msg::kFileSizeZero) + "\n" + std::string(msg::kCheckFileAgain)}};
+  for (const auto& [file, message] : cases) {
+    const Outcome o = Exe({"--all", file}, dir);
+    EXPECT_EQ(o.code, kExitStopped);
+    EXPECT_EQ(o.out, "");
+    EXPECT_EQ(o.err, message + "\n");
+  }
+  EXPECT_FALSE(fs::exists(dir / "nothere.err"));
   EXPECT_FALSE(fs::exists(dir / "empty.err"));
 }
 
 TEST(CliExe, CleanRunExits0WithTheFiveSummaryLines) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
+  fs::create_directories(dir / "job");
   WriteBytes(dir / "job" / "small.asc", kSmallBook);
   const Outcome o = Exe({"--txt", (dir / "job" / "small.asc").string()}, dir);
   EXPECT_EQ(o.code, kExitOk) << o.err;
   ExpectSummary(o, 1, 2, 0);
-  EXPECT_EQ(OutLines(o.out).size(), 5u);
+  EXPECT_EQ(SplitLines(o.out).size(), 5u);
   EXPECT_EQ(o.err, "");  // not a terminal: no progress
   // Only the product asked for; no errors, so no report and no listing.
   EXPECT_TRUE(fs::exists(dir / "job" / "small.txt"));
@@ -244,7 +189,7 @@ TEST(CliExe, CleanRunExits0WithTheFiveSummaryLines) {
 }
 
 TEST(Cli, DataErrorsExit1AndKeepTheReport) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   std::string book(kSmallBook);
   book += "3 0450000 20.000\r\n";                // run together: 3 fields
   book += "4 0450000 -20.000 0900000 1.50\r\n";  // negative distance
@@ -252,31 +197,30 @@ TEST(Cli, DataErrorsExit1AndKeepTheReport) {
   const Outcome o = Cli({(dir / "bad.asc").string()});
   EXPECT_EQ(o.code, kExitDataErrors);
   ExpectSummary(o, 1, 4, 2);
-  const std::string report = Bytes(dir / "bad.err");
+  const std::string report = FileBytes(dir / "bad.err");
   EXPECT_NE(report.find("Diem 3            nhap so lieu bi dinh"), std::string::npos) << report;
   EXPECT_NE(report.find("Diem 4            nhap canh am"), std::string::npos) << report;
   EXPECT_TRUE(fs::exists(dir / "bad.cpv"));
 }
 
 TEST(Cli, UnwritableProductIsNamedAndExits1WhileTheOthersAreWritten) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
+  fs::create_directories(dir / "job");
   WriteBytes(dir / "job" / "small.asc", kSmallBook);
   fs::create_directories(dir / "job" / "small.txt");  // a folder where the file should go
   const Outcome o = Cli({"--txt", "--kc", (dir / "job" / "small.asc").string()});
   EXPECT_EQ(o.code, kExitDataErrors);
   ExpectSummary(o, 1, 2, 0);
-  const auto lines = OutLines(o.out);
+  const auto lines = SplitLines(o.out);
   ASSERT_EQ(lines.size(), 6u) << o.out;
   EXPECT_EQ(lines[5], std::string(msg::kCannotWrite) + (dir / "job" / "small.txt").string());
   EXPECT_TRUE(fs::is_regular_file(dir / "job" / "small.kc"));
 }
 
-TEST(Cli, ProgressGoesToStderrOnlyOnATerminal) {
-  TempDir dir;
+// Off a terminal stderr stays empty (CleanRunExits0WithTheFiveSummaryLines).
+TEST(Cli, ProgressGoesToStderrOnATerminal) {
+  const fs::path dir = FreshFolder();
   WriteBytes(dir / "small.asc", kSmallBook);
-  const Outcome quiet = Cli({(dir / "small.asc").string()}, false);
-  EXPECT_EQ(quiet.code, kExitOk);
-  EXPECT_EQ(quiet.err, "");
   const Outcome shown = Cli({(dir / "small.asc").string()}, true);
   EXPECT_EQ(shown.code, kExitOk);
   EXPECT_NE(shown.err.find(std::string(msg::kStationTitle) + "DC01"), std::string::npos);
@@ -286,7 +230,7 @@ TEST(Cli, ProgressGoesToStderrOnlyOnATerminal) {
 }
 
 TEST(Cli, ControlFileOption) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   // The field book without its control points; they come from the common file.
   WriteBytes(dir / "obs.asc", "TR DC01 1.50\r\nDKD DC02\r\n1 0900000 50.000 0900000 1.50\r\n");
   WriteBytes(dir / "area.kc",
@@ -307,7 +251,7 @@ TEST(Cli, ControlFileOption) {
 }
 
 TEST(Cli, KindFromTheExtensionOrTheOption) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   WriteBytes(dir / "job.asc", kSmallBook);
   WriteBytes(dir / "job.dat", "anything");
   WriteBytes(dir / "other.dat", "anything");
@@ -324,7 +268,7 @@ TEST(Cli, KindFromTheExtensionOrTheOption) {
 
 // Without heights a control-coordinate line ends after Y: "TR name X Y".
 TEST(Cli, NoHeightsLeavesTheHeightOutOfControlLinesTheLastFlagWins) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   WriteBytes(dir / "small.asc", kSmallBook);
   const std::vector<std::pair<std::vector<std::string>, std::size_t>> cases = {
       {{}, 5u},
@@ -344,7 +288,7 @@ TEST(Cli, NoHeightsLeavesTheHeightOutOfControlLinesTheLastFlagWins) {
 }
 
 TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   WriteBytes(dir / "small.asc", kSmallBook);
   const std::vector<std::pair<std::string, std::string>> header = {
       {"--area", "Xã Đông Hội"},    {"--sketch-no", "07"},           {"--instrument", "NIKON DTM"},
@@ -357,7 +301,7 @@ TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
   }
   args.push_back((dir / "small.asc").string());
   ASSERT_EQ(Cli(args).code, kExitOk);
-  const std::string sketch = Bytes(dir / "small.sdo");
+  const std::string sketch = FileBytes(dir / "small.sdo");
   for (const auto& [option, text] : header) {
     EXPECT_NE(sketch.find(Utf8ToTcvn3(text)), std::string::npos) << option;
   }
@@ -365,7 +309,7 @@ TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
 }
 
 TEST(Cli, GarbageInputEndsWithAnExitCodeNeverACrash) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   std::string junk;
   std::uint32_t x = 12345;
   for (int i = 0; i < 200000; ++i) {
@@ -410,7 +354,7 @@ std::map<std::string, std::vector<Expected>> ReadExpected() {
 }
 
 // Copies the example into dir/work and runs it.
-Outcome RunExample(const TempDir& dir, std::vector<std::string> options) {
+Outcome RunExample(const fs::path& dir, std::vector<std::string> options) {
   fs::create_directories(dir / "work");
   fs::copy_file(fs::path(KAVU_EXAMPLES) / "job1.asc", dir / "work" / "job1.asc");
   options.push_back((dir / "work" / "job1.asc").string());
@@ -420,9 +364,9 @@ Outcome RunExample(const TempDir& dir, std::vector<std::string> options) {
 constexpr double kTolerance = 0.002;  // metres
 
 TEST(Example, EveryProductIsWrittenAndTheRunIsClean) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   const Outcome o = RunExample(dir, {"--all", "--seed", "1"});
-  EXPECT_EQ(o.code, kExitOk) << o.out << o.err << Bytes(dir / "work" / "job1.err");
+  EXPECT_EQ(o.code, kExitOk) << o.out << o.err << FileBytes(dir / "work" / "job1.err");
   // 4 stations; 100 detail points, 2 pegs, 4 orientation distances, 4 checks.
   ExpectSummary(o, 4, 110, 0);
   for (const char* name : {"job1.kc", "job1.td1", "job1.txt", "job1.dxf", "job1.sdo", "job1.cp"}) {
@@ -437,7 +381,7 @@ TEST(Example, EveryProductIsWrittenAndTheRunIsClean) {
 TEST(Example, CoordinatesAgreeWithTheTruePointsOfTheGenerator) {
   const auto expected = ReadExpected();
   ASSERT_EQ(expected.at("point").size(), 100u);
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   const Outcome o = RunExample(dir, {"--txt", "--kc", "--height-decimals", "3"});
   ASSERT_EQ(o.code, kExitOk) << o.err;
 
@@ -473,28 +417,28 @@ TEST(Example, CoordinatesAgreeWithTheTruePointsOfTheGenerator) {
 }
 
 TEST(Example, RegeneratedFieldBookComputesTheSameCoordinates) {
-  TempDir dir;
+  const fs::path dir = FreshFolder();
   ASSERT_EQ(RunExample(dir, {"--asc", "--txt"}).code, kExitOk);
   // The regenerated book carries the control points and pegs it needs; its
   // own run writes TRIDO/job1.txt.
   const Outcome again = Cli({"--txt", (dir / "TRIDO" / "job1.asc").string()});
-  EXPECT_EQ(again.code, kExitOk) << again.err << Bytes(dir / "TRIDO" / "job1.err");
+  EXPECT_EQ(again.code, kExitOk) << again.err << FileBytes(dir / "TRIDO" / "job1.err");
   ExpectSummary(again, 4, 102, 0);  // details and pegs only
-  EXPECT_EQ(Bytes(dir / "TRIDO" / "job1.txt"), Bytes(dir / "work" / "job1.txt"));
+  EXPECT_EQ(FileBytes(dir / "TRIDO" / "job1.txt"), FileBytes(dir / "work" / "job1.txt"));
 }
 
 TEST(Example, SameSeedSameProductsOtherSeedOtherSketch) {
-  TempDir first("-1"), second("-2");
+  const fs::path first = FreshFolder("kavu-cli-1"), second = FreshFolder("kavu-cli-2");
   ASSERT_EQ(RunExample(first, {"--all", "--seed", "42"}).code, kExitOk);
   ASSERT_EQ(RunExample(second, {"--all", "--seed", "42"}).code, kExitOk);
   for (const char* name : {"job1.kc", "job1.td1", "job1.txt", "job1.dxf", "job1.sdo", "job1.cp"}) {
-    EXPECT_EQ(Bytes(first / "work" / name), Bytes(second / "work" / name)) << name;
+    EXPECT_EQ(FileBytes(first / "work" / name), FileBytes(second / "work" / name)) << name;
   }
-  EXPECT_EQ(Bytes(first / "TRIDO" / "job1.asc"), Bytes(second / "TRIDO" / "job1.asc"));
+  EXPECT_EQ(FileBytes(first / "TRIDO" / "job1.asc"), FileBytes(second / "TRIDO" / "job1.asc"));
   // The seed does reach the generator: the sketch's orientation rows draw from it.
-  TempDir third("-3");
+  const fs::path third = FreshFolder("kavu-cli-3");
   ASSERT_EQ(RunExample(third, {"--sketch", "--seed", "43"}).code, kExitOk);
-  EXPECT_NE(Bytes(first / "work" / "job1.sdo"), Bytes(third / "work" / "job1.sdo"));
+  EXPECT_NE(FileBytes(first / "work" / "job1.sdo"), FileBytes(third / "work" / "job1.sdo"));
 }
 
 }  // namespace

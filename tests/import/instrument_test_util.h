@@ -1,13 +1,22 @@
-// Reading the test data of the instrument converters.
+// Reading the test data of the instrument converters, and a batch run of an
+// instrument file with the coordinates it computed.
 #pragma once
 
 #include <gtest/gtest.h>
 
-#include <algorithm>
+#include <cmath>
+#include <filesystem>
+#include <map>
+#include <sstream>
 #include <string>
 #include <string_view>
+#include <vector>
 
+#include "cli/cli.h"
 #include "core/lines.h"
+#include "core/numbers.h"
+#include "core/text.h"
+#include "tests/support.h"
 
 namespace kavu::testing {
 
@@ -21,9 +30,6 @@ inline std::string TestData(const std::string& relative) {
   return DataFile(KAVU_TEST_DATA "/import", relative);
 }
 inline std::string RealData(const std::string& name) { return DataFile(KAVU_REALDATA, name); }
-inline std::string Example(const std::string& name) {
-  return DataFile(KAVU_EXAMPLES "/instruments", name);
-}
 
 // Lines of a field book that begin with the given text.
 inline int CountStarting(std::string_view book, std::string_view prefix) {
@@ -44,5 +50,55 @@ inline bool AllLinesCrLf(std::string_view book) {
   }
   return true;
 }
+
+struct Xy {
+  double x = 0, y = 0;
+};
+
+// The point `reading` degrees clockwise from the orientation point, seen from
+// the station, at a horizontal distance.
+inline Xy Polar(Xy station, Xy orientation, double reading, double distance) {
+  const double pi = std::acos(-1.0);
+  const double az =
+      std::atan2(orientation.y - station.y, orientation.x - station.x) + reading * pi / 180;
+  return {station.x + distance * std::cos(az), station.y + distance * std::sin(az)};
+}
+
+inline const std::filesystem::path kExamples = std::filesystem::path(KAVU_EXAMPLES) / "instruments";
+
+// A batch run in a folder of its own, and the coordinates it wrote.
+class InstrumentRunTest : public ::testing::Test {
+ protected:
+  // Copies the files into the folder and runs the batch command on the first.
+  int Run(const std::vector<std::filesystem::path>& files, std::vector<std::string> args) {
+    for (const auto& file : files) std::filesystem::copy_file(file, dir_ / file.filename());
+    args.push_back((dir_ / files.front().filename()).string());
+    const std::vector<std::string_view> views(args.begin(), args.end());
+    std::ostringstream out, err;
+    return RunCli(views, out, err, false);
+  }
+
+  // Name -> X, Y of the coordinate text file (the last line of a name wins).
+  std::map<std::string, Xy> Coordinates(const std::string& name) const {
+    std::map<std::string, Xy> points;
+    for (std::string line : ReadLines(dir_ / name).value_or(std::vector<std::string>())) {
+      line = Trim(line);
+      const std::vector<std::string> f = SplitFields(line);
+      if (f.size() >= 3) points[f[0]] = {Val(f[1]), Val(f[2])};
+    }
+    return points;
+  }
+
+  void ExpectNear(const std::map<std::string, Xy>& points, const std::string& name,
+                  Xy expected) const {
+    const auto it = points.find(name);
+    ASSERT_NE(it, points.end()) << name;
+    EXPECT_NEAR(it->second.x, expected.x, tolerance_) << name;
+    EXPECT_NEAR(it->second.y, expected.y, tolerance_) << name;
+  }
+
+  const std::filesystem::path dir_ = FreshFolder("kavu-instrument");
+  double tolerance_ = 0.001;  // metres
+};
 
 }  // namespace kavu::testing

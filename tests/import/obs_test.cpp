@@ -20,20 +20,12 @@ using testing::TestData;
 // The expected book was checked line by line by hand.
 TEST(ObsConversion, MatchesHandCheckedBookByteForByte) {
   EXPECT_EQ(ConvertObs(TestData("obs/codes.obs"), 2), TestData("obs/codes.asc"));
-}
-
-TEST(ObsConversion, DetailRecordsHaveTheFieldsTheReaderNeeds) {
-  const std::string file =
-      "07TP                         S2\r\n"
-      "09F1                         S2           10.000            90.0            10.5\r\n"
-      "09F1                        105          100.000            80.0           110.5\r\n";
-  // Before any 03NM the prism height is 0.0; a plain number keeps its name.
-  EXPECT_EQ(ConvertObs(file, 2),
-            "TR              0.0\r\nDKD S2          \r\n"
-            "0000          00000   10.000   900000    0.0 S2        \r\n"
-            "105         1000000   98.481   800000    0.0\r\n");
-  // Without the Sokkia kind the set-up records are not read.
-  EXPECT_EQ(ConvertObs(file, 3).find("TR"), std::string::npos);
+  // Without the Sokkia kind the set-up records are not read: control points
+  // and bare detail records only.
+  const std::string other = ConvertObs(TestData("obs/codes.obs"), 3);
+  EXPECT_EQ(CountStarting(other, "TR "), 2);
+  EXPECT_EQ(CountStarting(other, "DKD "), 0);
+  EXPECT_EQ(testing::CountLines(other), 2 + 6);
 }
 
 // A reduced distance is rounded with ties to even (0.0625 m at a level sight
