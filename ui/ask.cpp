@@ -11,39 +11,52 @@ MsgAnswer Asker::operator()(const Question& question) const {
   return ShowMessageBox(parent_, question);
 }
 
-MsgAnswer ShowMessageBox(QWidget* parent, const Question& question) {
-  QMessageBox box(parent);
-  box.setWindowTitle(Q(kAppTitle));
-  QString text = question.text;
+QString ScreenLines(QString text) {
   text.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
   text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
-  box.setText(text);
-  switch (question.icon) {
+  return text;
+}
+
+namespace {
+
+QMessageBox::Icon BoxIcon(MsgIcon icon) {
+  switch (icon) {
     case MsgIcon::Critical:
-      box.setIcon(QMessageBox::Critical);
-      break;
+      return QMessageBox::Critical;
     case MsgIcon::Question:
-      box.setIcon(QMessageBox::Question);
-      break;
+      return QMessageBox::Question;
     case MsgIcon::Exclamation:
-      box.setIcon(QMessageBox::Warning);
-      break;
+      return QMessageBox::Warning;
     case MsgIcon::Information:
-      box.setIcon(QMessageBox::Information);
-      break;
+      return QMessageBox::Information;
     case MsgIcon::None:
       break;
   }
-  if (question.buttons == MsgButtons::YesNo) {
-    box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
-    box.setDefaultButton(question.defaultNo ? QMessageBox::No : QMessageBox::Yes);
-    box.setEscapeButton(QMessageBox::No);
-    // Closing the box counts as No.
-    return box.exec() == QMessageBox::Yes ? MsgAnswer::Yes : MsgAnswer::No;
+  return QMessageBox::NoIcon;
+}
+
+}  // namespace
+
+void SetUpMessageBox(QMessageBox& box, const Question& question) {
+  box.setWindowTitle(Q(kAppTitle));
+  box.setText(ScreenLines(question.text));
+  box.setIcon(BoxIcon(question.icon));
+  if (question.buttons != MsgButtons::YesNo) {
+    box.setStandardButtons(QMessageBox::Ok);
+    return;
   }
-  box.setStandardButtons(QMessageBox::Ok);
-  box.exec();
-  return MsgAnswer::Ok;
+  box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
+  box.setDefaultButton(question.defaultNo ? QMessageBox::No : QMessageBox::Yes);
+  box.setEscapeButton(QMessageBox::No);
+}
+
+MsgAnswer ShowMessageBox(QWidget* parent, const Question& question) {
+  QMessageBox box(parent);
+  SetUpMessageBox(box, question);
+  const int answer = box.exec();
+  if (question.buttons != MsgButtons::YesNo) return MsgAnswer::Ok;
+  // Closing the box counts as No.
+  return answer == QMessageBox::Yes ? MsgAnswer::Yes : MsgAnswer::No;
 }
 
 }  // namespace kavu::ui

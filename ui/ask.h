@@ -8,6 +8,7 @@
 
 #include "core/host.h"
 
+class QMessageBox;
 class QWidget;
 
 namespace kavu::ui {
@@ -42,7 +43,13 @@ class Asker {
   Hook hook_;
 };
 
-// The message box itself, captioned with the program's title.
+// Lines ended by CR LF or by a lone CR as lines ended by LF, as the screen
+// shows them.
+QString ScreenLines(QString text);
+
+// The box for a question, captioned with the program's title, not yet shown.
+void SetUpMessageBox(QMessageBox& box, const Question& question);
+// The message box itself.
 MsgAnswer ShowMessageBox(QWidget* parent, const Question& question);
 
 }  // namespace kavu::ui

@@ -25,14 +25,6 @@ namespace {
 // The layouts are given in twips; at 96 dots per inch a pixel is 15 twips.
 int Px(double twips) { return static_cast<int>(twips / 15.0); }
 
-QPlainTextEdit* MakeTextBox(QWidget* parent, const char* name) {
-  auto* box = new QPlainTextEdit(parent);
-  box->setObjectName(QLatin1String(name));
-  box->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
-  box->setLineWrapMode(QPlainTextEdit::NoWrap);
-  return box;
-}
-
 // Placement on load: the editor the right two fifths of the screen, the
 // viewer the left three fifths, both as high as the screen less a button.
 void Place(QWidget* window, bool rightPart, int buttonHeight) {
@@ -58,10 +50,7 @@ void Tell(const Asker& ask, const QString& path) {
 
 QString DecodeForScreen(const QByteArray& bytes) {
   const std::string utf8 = Tcvn3ToUtf8(std::string_view(bytes.constData(), bytes.size()));
-  QString text = Q(utf8);
-  text.replace(QStringLiteral("\r\n"), QStringLiteral("\n"));
-  text.replace(QLatin1Char('\r'), QLatin1Char('\n'));
-  return text;
+  return ScreenLines(Q(utf8));
 }
 
 QByteArray EncodeForFile(const QString& text) {
@@ -117,59 +106,68 @@ bool SaveWithBackup(const Asker& ask, const QString& target, const QString& want
   return true;
 }
 
-Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
-    : Window(parent), ask_(ask), finder_(finder) {
-  setObjectName(QStringLiteral("xem"));
-  setWindowTitle(Q(kViewerCaption));
-  txtxem_ = MakeTextBox(this, "txtxem");
-  ghixem_ = MakeButton(this, "ghixem", Q(kSave));
-  timxem_ = MakeButton(this, "Timxem", Q(kFind));
-  // No cancel button: Esc must not close the viewer and drop its edits.
-  thoat_ = MakeButton(this, "thoat", Q(kExit));
-  Place(this, false, thoat_->sizeHint().height());
-  connect(ghixem_, &QPushButton::clicked, this, &Xem::ghixem_Click);
-  connect(timxem_, &QPushButton::clicked, this, &Xem::Timxem_Click);
-  connect(thoat_, &QPushButton::clicked, this, &Xem::thoat_Click);
+TextWindow::TextWindow(const Asker& ask, Timthay& finder, int ktra, const char* boxName,
+                       const char* saveName, const char* findName, QWidget* parent)
+    : Window(parent), ask_(ask), finder_(finder), ktra_(ktra) {
+  text_ = new QPlainTextEdit(this);
+  text_->setObjectName(QLatin1String(boxName));
+  text_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
+  text_->setLineWrapMode(QPlainTextEdit::NoWrap);
+  save_ = MakeButton(this, saveName, Q(kSave));
+  find_ = MakeButton(this, findName, Q(kFind));
 }
 
-void Xem::showFile(const QString& path, const QString& text) {
+void TextWindow::showText(const QString& path, const QString& backup, std::string_view caption,
+                          const QString& text) {
   file_ = path;
-  txtxem_->setPlainText(text);
-  setWindowTitle(Q(kMoreAboutFile) + QDir::toNativeSeparators(path));
+  backup_ = backup;
+  text_->setPlainText(text);
+  setWindowTitle(Q(caption) + QDir::toNativeSeparators(path));
   show();
   raise();
 }
 
-void Xem::ghixem_Click() {
+void TextWindow::save() {
   if (file_.isEmpty()) return;
-  // The backup keeps the whole name, so a report's backup never replaces the
-  // field book's "name.bak".
-  SaveWithBackup(ask_, file_, file_ + QStringLiteral(".bak"), BoxText(txtxem_));
+  SaveWithBackup(ask_, file_, backup_, BoxText(text_));
 }
 
-void Xem::Timxem_Click() { finder_.open(2); }
+void TextWindow::find() { finder_.open(ktra_); }
 
-void Xem::thoat_Click() { close(); }
+Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
+    : TextWindow(ask, finder, 2, "txtxem", "ghixem", "Timxem", parent) {
+  setObjectName(QStringLiteral("xem"));
+  setWindowTitle(Q(kViewerCaption));
+  // No cancel button: Esc must not close the viewer and drop its edits.
+  thoat_ = MakeButton(this, "thoat", Q(kExit));
+  Place(this, false, thoat_->sizeHint().height());
+  connect(save_, &QPushButton::clicked, this, &Xem::ghixem_Click);
+  connect(find_, &QPushButton::clicked, this, &Xem::Timxem_Click);
+  connect(thoat_, &QPushButton::clicked, this, &Xem::thoat_Click);
+}
+
+void Xem::showFile(const QString& path, const QString& text) {
+  // The backup keeps the whole name, so a report's backup never replaces the
+  // field book's "name.bak".
+  showText(path, path + QStringLiteral(".bak"), kMoreAboutFile, text);
+}
 
 void Xem::resizeEvent(QResizeEvent* event) {
   Window::resizeEvent(event);
   const int w = width();
   const int h = height();
   const int b = thoat_->sizeHint().height();
-  txtxem_->setGeometry(0, 0, w, std::max(0, h - 2 * b));
+  text_->setGeometry(0, 0, w, std::max(0, h - 2 * b));
   const int bw = Px(1200);
-  ghixem_->setGeometry(w / 2 - Px(1900), h - b * 3 / 2, bw, b);
-  timxem_->setGeometry(w / 2 - Px(600), h - b * 3 / 2, bw, b);
+  save_->setGeometry(w / 2 - Px(1900), h - b * 3 / 2, bw, b);
+  find_->setGeometry(w / 2 - Px(600), h - b * 3 / 2, bw, b);
   thoat_->setGeometry(w / 2 + Px(700), h - b * 3 / 2, bw, b);
 }
 
 Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
-    : Window(parent), ask_(ask), finder_(finder), viewer_(viewer) {
+    : TextWindow(ask, finder, 1, "txtsuasl", "ghi", "timkiem", parent), viewer_(viewer) {
   setObjectName(QStringLiteral("suasl"));
   setWindowTitle(Q(kEditorCaption));
-  txtsuasl_ = MakeTextBox(this, "txtsuasl");
-  ghi_ = MakeButton(this, "ghi", Q(kSave));
-  timkiem_ = MakeButton(this, "timkiem", Q(kFind));
   xemfile_ = MakeButton(this, "xemfile", Q(kViewFile));
   xemfile_->setDefault(true);
   thoat_ = MakeButton(this, "thoat", Q(kExit));
@@ -182,8 +180,8 @@ Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
     return dialog.selectedFiles().first();
   };
   Place(this, true, thoat_->sizeHint().height());
-  connect(ghi_, &QPushButton::clicked, this, &Suasl::ghi_Click);
-  connect(timkiem_, &QPushButton::clicked, this, &Suasl::timkiem_Click);
+  connect(save_, &QPushButton::clicked, this, &Suasl::ghi_Click);
+  connect(find_, &QPushButton::clicked, this, &Suasl::timkiem_Click);
   connect(xemfile_, &QPushButton::clicked, this, &Suasl::xemfile_Click);
   connect(thoat_, &QPushButton::clicked, this, &Suasl::thoat_Click);
 }
@@ -192,21 +190,9 @@ void Suasl::openFile(const QString& filesl, const QString& daufile, const QStrin
                      const QString& text) {
   // The file is kept as it was opened: a later click in the main window's
   // file list must not send this text over another file.
-  filesl_ = filesl;
-  daufile_ = daufile;
   tentm_ = tentm;
-  txtsuasl_->setPlainText(text);
-  setWindowTitle(Q(kDataOfFile) + QDir::toNativeSeparators(filesl));
-  show();
-  raise();
+  showText(filesl, daufile + QStringLiteral(".bak"), kDataOfFile, text);
 }
-
-void Suasl::ghi_Click() {
-  if (filesl_.isEmpty()) return;
-  SaveWithBackup(ask_, filesl_, daufile_ + QStringLiteral(".bak"), BoxText(txtsuasl_));
-}
-
-void Suasl::timkiem_Click() { finder_.open(1); }
 
 void Suasl::xemfile_Click() {
   const QString proposed = Q(kErrPattern);
@@ -220,18 +206,16 @@ void Suasl::xemfile_Click() {
   viewer_.showFile(chosen, DecodeForScreen(QByteArray(bytes->data(), bytes->size())));
 }
 
-void Suasl::thoat_Click() { close(); }
-
 void Suasl::resizeEvent(QResizeEvent* event) {
   Window::resizeEvent(event);
   const int w = width();
   const int h = height();
-  txtsuasl_->setGeometry(0, 0, w, std::max(0, h - Px(700)));
+  text_->setGeometry(0, 0, w, std::max(0, h - Px(700)));
   const int top = h - Px(525);
   const int bw = Px(1000);
   const int bh = std::min(thoat_->sizeHint().height(), Px(450));
-  ghi_->setGeometry(w / 2 - Px(2150), top, bw, bh);
-  timkiem_->setGeometry(w / 2 - Px(1050), top, bw, bh);
+  save_->setGeometry(w / 2 - Px(2150), top, bw, bh);
+  find_->setGeometry(w / 2 - Px(1050), top, bw, bh);
   xemfile_->setGeometry(w / 2 + Px(50), top, bw, bh);
   thoat_->setGeometry(w / 2 + Px(1150), top, bw, bh);
 }

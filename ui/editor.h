@@ -5,6 +5,7 @@
 #include <QByteArray>
 #include <QString>
 #include <functional>
+#include <string_view>
 
 #include "ui/dialog.h"
 
@@ -34,38 +35,58 @@ bool SaveWithBackup(const Asker& ask, const QString& target, const QString& back
 // empty text or the proposed name itself when nothing was chosen.
 using FileChooser = std::function<QString(const QString& folder, const QString& proposed)>;
 
-class Xem : public Window {
+// What the viewer and the editor share: a file's text in a box, saved over
+// the file with a backup, searched by the find window.
+class TextWindow : public Window {
+  Q_OBJECT
+ public:
+  QString file() const { return file_; }
+  void thoat_Click() { close(); }
+
+ protected:
+  // Builds the text box, then the save and find buttons (in that tab order);
+  // ktra tells the find window which text it works on.
+  TextWindow(const Asker& ask, Timthay& finder, int ktra, const char* boxName, const char* saveName,
+             const char* findName, QWidget* parent);
+  // Shows a file's text, captioned with the file's name behind caption; saves
+  // go to path, its old content to backup.
+  void showText(const QString& path, const QString& backup, std::string_view caption,
+                const QString& text);
+  void save();
+  void find();
+
+  const Asker& ask_;
+  QPlainTextEdit* text_;
+  QPushButton* save_;
+  QPushButton* find_;
+  QPushButton* thoat_ = nullptr;
+
+ private:
+  Timthay& finder_;
+  int ktra_;
+  QString file_, backup_;
+};
+
+class Xem : public TextWindow {
   Q_OBJECT
  public:
   Xem(const Asker& ask, Timthay& finder, QWidget* parent = nullptr);
-  QPlainTextEdit* txtxem() const { return txtxem_; }
-  QString file() const { return file_; }
+  QPlainTextEdit* txtxem() const { return text_; }
   // Shows a file's text; its saves go to that file, the backup beside it.
   void showFile(const QString& path, const QString& text);
 
-  void ghixem_Click();
-  void Timxem_Click();
-  void thoat_Click();
+  void ghixem_Click() { save(); }
+  void Timxem_Click() { find(); }
 
  protected:
   void resizeEvent(QResizeEvent* event) override;  // Form_Resize
-
- private:
-  const Asker& ask_;
-  Timthay& finder_;
-  QString file_;
-  QPlainTextEdit* txtxem_;
-  QPushButton* ghixem_;
-  QPushButton* timxem_;
-  QPushButton* thoat_;
 };
 
-class Suasl : public Window {
+class Suasl : public TextWindow {
   Q_OBJECT
  public:
   Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent = nullptr);
-  QPlainTextEdit* txtsuasl() const { return txtsuasl_; }
-  QString file() const { return filesl_; }
+  QPlainTextEdit* txtsuasl() const { return text_; }
   void setChooser(FileChooser chooser) { chooser_ = std::move(chooser); }
 
   // The main window's file: its path, the base name of its backup, and its
@@ -73,25 +94,18 @@ class Suasl : public Window {
   void openFile(const QString& filesl, const QString& daufile, const QString& tentm,
                 const QString& text);
 
-  void ghi_Click();
-  void timkiem_Click();
+  void ghi_Click() { save(); }
+  void timkiem_Click() { find(); }
   void xemfile_Click();
-  void thoat_Click();
 
  protected:
   void resizeEvent(QResizeEvent* event) override;  // Form_Resize
 
  private:
-  const Asker& ask_;
-  Timthay& finder_;
   Xem& viewer_;
   FileChooser chooser_;
-  QString filesl_, daufile_, tentm_;
-  QPlainTextEdit* txtsuasl_;
-  QPushButton* ghi_;
-  QPushButton* timkiem_;
+  QString tentm_;
   QPushButton* xemfile_;
-  QPushButton* thoat_;
 };
 
 }  // namespace kavu::ui

@@ -40,10 +40,7 @@ int ComputeAlone(kavu::ui::MainWindow& window, const QString& file, const QStrin
     if (!picture.isEmpty() && question.icon == MsgIcon::Information) {
       // The summary: shown for a moment so that its picture can be taken.
       QMessageBox box(&window);
-      box.setWindowTitle(Q(kavu::ui::kAppTitle));
-      box.setIcon(QMessageBox::Information);
-      box.setText(QString(question.text).replace(QLatin1Char('\r'), QLatin1Char('\n')));
-      box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
+      kavu::ui::SetUpMessageBox(box, question);
       box.show();
       QApplication::processEvents();
       box.grab().save(Picture(picture, "summary"));

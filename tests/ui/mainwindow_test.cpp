@@ -5,7 +5,6 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDir>
-#include <QLabel>
 #include <QLineEdit>
 #include <QPushButton>
 #include <QTextBrowser>
@@ -27,30 +26,24 @@ class MainWindowTest : public QObject {
 
   QTemporaryDir store_;
 
-  template <typename T>
-  static T* Child(QWidget& window, const char* name) {
-    T* child = window.findChild<T*>(QLatin1String(name));
-    if (child == nullptr) qFatal("no control %s", name);
-    return child;
-  }
-
   // Clicks (or double-clicks) a file of the file list as the mouse would.
   static bool ClickFile(MainWindow& w, const QString& name, bool twice = false) {
     auto* list = Child<FileList>(w, "lstfile");
     const QList<QListWidgetItem*> items = list->findItems(name, Qt::MatchExactly);
     if (items.isEmpty()) return false;
     const QPoint at = list->visualItemRect(items.first()).center();
-    if (twice) {
-      QTest::mouseClick(list->viewport(), Qt::LeftButton, {}, at);
-      QTest::mouseDClick(list->viewport(), Qt::LeftButton, {}, at);
-    } else {
-      QTest::mouseClick(list->viewport(), Qt::LeftButton, {}, at);
-    }
+    QTest::mouseClick(list->viewport(), Qt::LeftButton, {}, at);
+    if (twice) QTest::mouseDClick(list->viewport(), Qt::LeftButton, {}, at);
     return true;
   }
 
-  static QString Native(const QString& path) { return QDir::toNativeSeparators(path); }
+  // The example field book in the desk's folder, shown in the lists.
+  static bool ShowExample(Desk& desk) {
+    return QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), desk.path("job1.asc")) &&
+           Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path());
+  }
 
+  static QString Native(const QString& path) { return QDir::toNativeSeparators(path); }
   static QString Sep() { return QString(QDir::separator()); }
 
  private slots:
@@ -60,9 +53,7 @@ class MainWindowTest : public QObject {
     QTemporaryDir root;
     QVERIFY(QDir(root.path()).mkpath(QStringLiteral("Data/Survey")));
     const QString survey = Native(root.path() + QStringLiteral("/Data/Survey"));
-    WriteAll(survey + QStringLiteral("/job1.sdr"), "x");
-    WriteAll(survey + QStringLiteral("/job1.asc"), "x");
-    WriteAll(survey + QStringLiteral("/README"), "x");
+    for (const char* name : {"/job1.sdr", "/job1.asc", "/README"}) WriteAll(survey + name, "x");
 
     MainWindow w;
     w.show();
@@ -76,13 +67,13 @@ class MainWindowTest : public QObject {
     QVERIFY(ClickFile(w, QStringLiteral("job1.sdr")));
 
     const RunState& st = w.state();
-    const QString data = Native(root.path() + QStringLiteral("/Data"));
+    const QString trido = Native(root.path() + QStringLiteral("/Data/TRIDO")) + Sep();
     QCOMPARE(Q(st.filesl), survey + Sep() + QStringLiteral("job1.sdr"));
     QCOMPARE(Q(st.tentm), survey + Sep());
     QCOMPARE(Q(st.daufile), survey + Sep() + QStringLiteral("job1"));
     QCOMPARE(Q(st.duoifile), QStringLiteral("sdr"));
-    QCOMPARE(Q(st.tentmbd), data + Sep() + QStringLiteral("TRIDO") + Sep());
-    QCOMPARE(Q(st.filesl1), data + Sep() + QStringLiteral("TRIDO") + Sep() + "job1.asc");
+    QCOMPARE(Q(st.tentmbd), trido);
+    QCOMPARE(Q(st.filesl1), trido + "job1.asc");
     QCOMPARE(Child<QLineEdit>(w, "txtfile")->text(), Q(st.filesl));
 
     // The last kind lists every file, also one without a dot.
@@ -93,37 +84,31 @@ class MainWindowTest : public QObject {
   }
 
   void aDotInAFolderNameDoesNotRenameTheProducts() {
-    QTemporaryDir root;
-    QVERIFY(QDir(root.path()).mkpath(QStringLiteral("My.Data")));
-    const QString folder = Native(root.path() + QStringLiteral("/My.Data"));
+    Desk desk;
+    QVERIFY(QDir(desk.work.path()).mkpath(QStringLiteral("My.Data")));
+    const QString folder = Native(desk.path("My.Data"));
     WriteAll(folder + QStringLiteral("/job1.asc"), "x");
-    MainWindow w;
-    w.show();
-    QVERIFY(Child<FolderList>(w, "lsttm")->setPath(folder));
-    QVERIFY(ClickFile(w, QStringLiteral("job1.asc")));
-    QCOMPARE(Q(w.state().daufile), folder + Sep() + QStringLiteral("job1"));
-    QCOMPARE(Q(w.state().duoifile), QStringLiteral("asc"));
+    desk.w.show();
+    QVERIFY(Child<FolderList>(desk.w, "lsttm")->setPath(folder));
+    QVERIFY(ClickFile(desk.w, QStringLiteral("job1.asc")));
+    QCOMPARE(Q(desk.w.state().daufile), folder + Sep() + QStringLiteral("job1"));
+    QCOMPARE(Q(desk.w.state().duoifile), QStringLiteral("asc"));
   }
 
   void aComputeEndsWithTheSummary() {
-    QTemporaryDir work;
-    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    bool ended = false;
-    w.setEndHook([&ended] { ended = true; });
+    Desk desk;
+    MainWindow& w = desk.w;
     QStringList titles;
     connect(&w, &QWidget::windowTitleChanged, this,
             [&titles](const QString& title) { titles.append(title); });
     w.show();
-    QVERIFY(Child<FolderList>(w, "lsttm")->setPath(work.path()));
+    QVERIFY(ShowExample(desk));
     Child<QCheckBox>(w, "fdxf")->click();  // grayed -> ticked
     QVERIFY(ClickFile(w, QStringLiteral("job1.asc")));
     QTest::mouseClick(Child<QPushButton>(w, "tinh"), Qt::LeftButton);
 
-    QCOMPARE(person.asked.size(), 1u);
-    const Question& summary = person.asked[0];
+    QCOMPARE(desk.person.asked.size(), 1u);
+    const Question& summary = desk.person.asked[0];
     QCOMPARE(summary.icon, MsgIcon::Information);
     QCOMPARE(summary.buttons, MsgButtons::YesNo);
     const QStringList lines = summary.text.split(QLatin1Char('\r'));
@@ -136,110 +121,89 @@ class MainWindowTest : public QObject {
 
     QVERIFY(titles.contains(Q(msg::kStationTitle) + QStringLiteral("DC01        ")));
     QCOMPARE(w.windowTitle(), Q(msg::kProgramTitle));
-    QVERIFY(QFile::exists(work.filePath("job1.txt")));
-    QVERIFY(QFile::exists(work.filePath("job1.dxf")));
-    QVERIFY(!QFile::exists(work.filePath("job1.err")));  // no errors, no report
-    QVERIFY(!ended);
-    QCOMPARE(Child<QLineEdit>(w, "txtfile")->text(), Native(work.filePath("job1.asc")));
+    QVERIFY(QFile::exists(desk.path("job1.txt")));
+    QVERIFY(QFile::exists(desk.path("job1.dxf")));
+    QVERIFY(!QFile::exists(desk.path("job1.err")));  // no errors, no report
+    QVERIFY(!desk.ended);
+    QCOMPARE(Child<QLineEdit>(w, "txtfile")->text(), Native(desk.path("job1.asc")));
     QCOMPARE(Child<QComboBox>(w, "cbkieu")->currentIndex(), 0);
-    QVERIFY(Child<FileList>(w, "lstfile")->findItems("job1.asc", Qt::MatchExactly).size() == 1);
+    QCOMPARE(Child<FileList>(w, "lstfile")->findItems("job1.asc", Qt::MatchExactly).size(), 1);
 
     // No to "continue?" ends the program, and the session's choices are kept.
-    person.answers = {MsgAnswer::No};
+    desk.person.answers = {MsgAnswer::No};
     Child<QComboBox>(w, "TyleTXT")->setCurrentText(QStringLiteral("500"));
     QTest::keyClick(Child<QLineEdit>(w, "txtfile"), Qt::Key_Return);  // tinh is the default
-    QCOMPARE(person.asked.size(), 2u);
-    QVERIFY(ended);
+    QCOMPARE(desk.person.asked.size(), 2u);
+    QVERIFY(desk.ended);
     QCOMPARE(Stored("KAVU_TyleTXT"), QStringLiteral("500"));
   }
 
   void aRunIsNotClosedUnderway() {
-    QTemporaryDir work;
-    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    bool ended = false;
-    w.setEndHook([&ended] { ended = true; });
+    Desk desk;
+    MainWindow& w = desk.w;
+    QVERIFY(ShowExample(desk));
     w.show();
     // The close box pressed while the title shows the first station.
     connect(&w, &QWidget::windowTitleChanged, &w, [&w](const QString& title) {
       if (title.startsWith(Q(msg::kStationTitle))) w.close();
     });
-    w.SetFileBox(Native(work.filePath("job1.asc")).toStdString());
+    w.SetFileBox(Native(desk.path("job1.asc")).toStdString());
     w.tinh_Click();
-    QCOMPARE(person.asked.size(), 1u);  // the summary, answered Yes
-    QVERIFY(!ended);
+    QCOMPARE(desk.person.asked.size(), 1u);  // the summary, answered Yes
+    QVERIFY(!desk.ended);
     QVERIFY(w.isVisible());
     QVERIFY(!IsStored("KAVU_Ftd"));
   }
 
   void theFieldSketchTakesTheStoredHeaderTexts() {
-    QTemporaryDir work;
-    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));
-    {
-      QSettings store(QSettings::IniFormat, QSettings::UserScope, Q(kAppTitle), Q(kAppTitle));
-      store.setValue("Settings/NhapSDO5", Q("Lê Thị Hoa"));
-    }
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    w.setEndHook([] {});
-    QVERIFY(Child<FolderList>(w, "lsttm")->setPath(work.path()));
-    QVERIFY(ClickFile(w, QStringLiteral("job1.asc")));
-    w.tinh_Click();
-    QVERIFY(!w.headerFormLoaded());  // not wanted, not read
-    QVERIFY(!QFile::exists(work.filePath("job1.sdo")));
+    Store().setValue(Key("NhapSDO5"), Q("Lê Thị Hoa"));
+    Desk desk;
+    QVERIFY(ShowExample(desk));
+    QVERIFY(ClickFile(desk.w, QStringLiteral("job1.asc")));
+    desk.w.tinh_Click();
+    QVERIFY(!desk.w.headerFormLoaded());  // not wanted, not read
+    QVERIFY(!QFile::exists(desk.path("job1.sdo")));
 
-    Child<QCheckBox>(w, "fsdo")->setCheckState(Qt::Checked);
-    w.tinh_Click();
+    Child<QCheckBox>(desk.w, "fsdo")->setCheckState(Qt::Checked);
+    desk.w.tinh_Click();
     // Read from the store through the form, loaded without being shown.
-    QVERIFY(w.headerFormLoaded());
-    QVERIFY(!w.headerForm().isVisible());
+    QVERIFY(desk.w.headerFormLoaded());
+    QVERIFY(!desk.w.headerForm().isVisible());
     const std::string surveyor = Utf8ToTcvn3("Lê Thị Hoa");
-    QVERIFY(ReadAll(work.filePath("job1.sdo")).contains(QByteArray::fromStdString(surveyor)));
+    QVERIFY(desk.read("job1.sdo").contains(QByteArray::fromStdString(surveyor)));
   }
 
   void aDoubleClickComputesAndARefusedFileIsReported() {
-    QTemporaryDir work;
-    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), work.filePath("job1.asc")));
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    w.setEndHook([] {});
-    w.show();
-    QVERIFY(Child<FolderList>(w, "lsttm")->setPath(work.path()));
-    QVERIFY(ClickFile(w, QStringLiteral("job1.asc"), true));
-    QCOMPARE(person.asked.size(), 1u);
-    QCOMPARE(person.asked[0].icon, MsgIcon::Information);
+    Desk desk;
+    desk.w.show();
+    QVERIFY(ShowExample(desk));
+    QVERIFY(ClickFile(desk.w, QStringLiteral("job1.asc"), true));
+    const std::vector<Question>& asked = desk.person.asked;
+    QCOMPARE(asked.size(), 1u);
+    QCOMPARE(asked[0].icon, MsgIcon::Information);
 
-    Child<QLineEdit>(w, "txtfile")->clear();
-    Child<QPushButton>(w, "tinh")->click();
-    QCOMPARE(person.asked.size(), 2u);
-    QCOMPARE(person.asked[1].text, Q(msg::kNoFileChosen));
-    QCOMPARE(person.asked[1].icon, MsgIcon::Critical);
-    QCOMPARE(person.asked[1].buttons, MsgButtons::Ok);
+    Child<QLineEdit>(desk.w, "txtfile")->clear();
+    Child<QPushButton>(desk.w, "tinh")->click();
+    QCOMPARE(asked.size(), 2u);
+    QCOMPARE(asked[1].text, Q(msg::kNoFileChosen));
+    QCOMPARE(asked[1].icon, MsgIcon::Critical);
+    QCOMPARE(asked[1].buttons, MsgButtons::Ok);
   }
 
-  void editWithoutAFileSaysSo() {
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    Child<QPushButton>(w, "suasolieu")->click();
-    QCOMPARE(person.asked.size(), 1u);
-    QCOMPARE(person.asked[0].text, Q(kFileNotFoundShort));
-    QCOMPARE(person.asked[0].icon, MsgIcon::Critical);
-    QVERIFY(!w.editor().isVisible());
-  }
+  void editWithoutAFileSaysSoAndHelpOpensTheManual() {
+    Desk desk;
+    const std::vector<Question>& asked = desk.person.asked;
+    Child<QPushButton>(desk.w, "suasolieu")->click();
+    QCOMPARE(asked.size(), 1u);
+    QCOMPARE(asked[0].text, Q(kFileNotFoundShort));
+    QCOMPARE(asked[0].icon, MsgIcon::Critical);
+    QVERIFY(!desk.w.editor().isVisible());
 
-  void helpOpensTheManualBesideTheProgram() {
-    Person person;
-    MainWindow w;
-    w.asker().setHook(person.hook());
-    Child<QPushButton>(w, "trogiup")->click();
-    QCOMPARE(person.asked.size(), 0u);
-    auto* help = w.findChild<QWidget*>(QStringLiteral("help"));
-    QVERIFY(help != nullptr && help->isVisible());
+    // The manual beside the program, opened without a question.
+    Child<QPushButton>(desk.w, "trogiup")->click();
+    QCOMPARE(asked.size(), 1u);
+    auto* help = Child<QWidget>(desk.w, "help");
+    QVERIFY(help->isVisible());
     QVERIFY(help->findChild<QTextBrowser*>()->toPlainText().contains(QStringLiteral("Inputs")));
   }
 
@@ -257,31 +221,6 @@ class MainWindowTest : public QObject {
     Child<QPushButton>(w, "KC")->click();
     QCOMPARE(box->text(), Native(QStringLiteral("/data/kc chung.txt")));
     QCOMPARE(use->checkState(), Qt::Checked);
-  }
-
-  void everyControlCarriesItsCaption() {
-    MainWindow w;
-    const std::vector<std::pair<const char*, std::string_view>> buttons = {{"tinh", kCompute},
-                                                                           {"suasolieu", kEditData},
-                                                                           {"trogiup", kHelp},
-                                                                           {"thoat", kExit},
-                                                                           {"KC", kKcButton}};
-    for (const auto& [name, caption] : buttons) {
-      QCOMPARE(Child<QPushButton>(w, name)->text(), Q(caption));
-    }
-    QVERIFY(Child<QPushButton>(w, "tinh")->isDefault());
-    auto* kinds = Child<QComboBox>(w, "cbkieu");
-    QCOMPARE(kinds->count(), 10);
-    QCOMPARE(kinds->itemText(0), Q("Số liệu sổ đo                    [*.asc]"));
-    QCOMPARE(kinds->itemText(9), Q("Số liệu khác                      [*.*]"));
-    QCOMPARE(Child<QComboBox>(w, "TyleTXT")->count(), 9);
-    for (const char* name :
-         {"lbdia", "lbtm", "txttm", "lbkieu", "lbfile", "Label1", "Label2", "Label3", "lbtieude"}) {
-      Child<QLabel>(w, name);
-    }
-    Child<QWidget>(w, "luachon");
-    Child<QWidget>(w, "Frame1");
-    QCOMPARE(w.windowTitle(), Q(kMainCaption));
   }
 };
 

@@ -7,6 +7,7 @@
 #include <QLineEdit>
 #include <QPushButton>
 #include <QtTest>
+#include <tuple>
 
 #include "support.h"
 #include "ui/lists.h"
@@ -21,13 +22,6 @@ class SettingsTest : public QObject {
   Q_OBJECT
 
   QTemporaryDir store_;
-
-  template <typename T>
-  static T* Child(QWidget& window, const char* name) {
-    T* child = window.findChild<T*>(QLatin1String(name));
-    if (child == nullptr) qFatal("no control %s", name);
-    return child;
-  }
 
  private slots:
   void init() { UseScratchSettings(store_); }
@@ -59,68 +53,61 @@ class SettingsTest : public QObject {
   void everyKeyIsWrittenOnCloseAndRestored() {
     QTemporaryDir folder;
     const QString path = QDir::toNativeSeparators(folder.path());
+    // Text boxes and check boxes with their keys and the values set.
+    const std::vector<std::tuple<const char*, const char*, QString>> texts = {
+        {"txtFKC", "KAVU_txtFKC", QStringLiteral("/data/kc, chung.txt")},
+        {"Htxt", "KAVU_HTXT", QStringLiteral("1.5")},
+        {"txtSoleDC", "KAVU_SoleDC", QStringLiteral("3")}};
+    const std::vector<std::tuple<const char*, const char*, Qt::CheckState>> boxes = {
+        {"ckKC", "KAVU_ckKC", Qt::Checked}, {"fkc", "KAVU_Fkc", Qt::Checked},
+        {"fasc", "KAVU_Fasc", Qt::Checked}, {"fcp", "KAVU_Fcp", Qt::Checked},
+        {"ftd", "KAVU_Ftd", Qt::Unchecked}, {"fdc", "KAVU_Fdc", Qt::Unchecked}};
     {
       MainWindow w;
       w.setEndHook([] {});
-      Child<QLineEdit>(w, "txtFKC")->setText(QStringLiteral("/data/kc, chung.txt"));
-      Child<QCheckBox>(w, "ckKC")->setCheckState(Qt::Checked);
+      for (const auto& [name, key, text] : texts) Child<QLineEdit>(w, name)->setText(text);
+      for (const auto& [name, key, state] : boxes) Child<QCheckBox>(w, name)->setCheckState(state);
       w.SelectKind(5);
       Child<FolderList>(w, "lsttm")->setPath(path);
       Child<QComboBox>(w, "TyleTXT")->setCurrentText(QStringLiteral("2000"));
-      Child<QLineEdit>(w, "Htxt")->setText(QStringLiteral("1.5"));
-      Child<QLineEdit>(w, "txtSoleDC")->setText(QStringLiteral("3"));
-      for (const char* name : {"fkc", "fasc", "fcp"}) {
-        Child<QCheckBox>(w, name)->setCheckState(Qt::Checked);
-      }
-      for (const char* name : {"ftd", "fdc"}) {
-        Child<QCheckBox>(w, name)->setCheckState(Qt::Unchecked);
-      }
       Child<QCheckBox>(w, "fsdo")->click();
       w.show();
       w.close();
     }
-    const std::vector<std::pair<const char*, QString>> expected = {
-        {"KAVU_txtFKC", QStringLiteral("/data/kc, chung.txt")},
-        {"KAVU_ckKC", QStringLiteral("1")},
-        {"KAVU_cbkieu", QStringLiteral("5")},
-        {"KAVU_LstTM", path},
-        {"KAVU_TyleTXT", QStringLiteral("2000")},
-        {"KAVU_HTXT", QStringLiteral("1.5")},
-        {"KAVU_SoleDC", QStringLiteral("3")},
-        {"KAVU_Fkc", QStringLiteral("1")},
-        {"KAVU_Fasc", QStringLiteral("1")},
-        {"KAVU_Ftd", QStringLiteral("0")},
-        {"KAVU_Fcp", QStringLiteral("1")},
-        {"KAVU_Fdc", QStringLiteral("0")}};
-    for (const auto& [key, value] : expected) QCOMPARE(Stored(key), value);
+    for (const auto& [name, key, text] : texts) QCOMPARE(Stored(key), text);
+    for (const auto& [name, key, state] : boxes) {
+      QCOMPARE(Stored(key), state == Qt::Checked ? QStringLiteral("1") : QStringLiteral("0"));
+    }
+    QCOMPARE(Stored("KAVU_cbkieu"), QStringLiteral("5"));
+    QCOMPARE(Stored("KAVU_LstTM"), path);
+    QCOMPARE(Stored("KAVU_TyleTXT"), QStringLiteral("2000"));
     QVERIFY(IsStored("KAVU_LstDia"));
     QVERIFY(!IsStored("KAVU_Fsdo"));
 
     MainWindow again;
-    QCOMPARE(Child<QLineEdit>(again, "txtFKC")->text(), QStringLiteral("/data/kc, chung.txt"));
-    QCOMPARE(Child<QCheckBox>(again, "ckKC")->checkState(), Qt::Checked);
+    for (const auto& [name, key, text] : texts) {
+      QCOMPARE(Child<QLineEdit>(again, name)->text(), text);
+    }
+    for (const auto& [name, key, state] : boxes) {
+      QCOMPARE(Child<QCheckBox>(again, name)->checkState(), state);
+    }
     QCOMPARE(Child<QComboBox>(again, "cbkieu")->currentIndex(), 5);
     QCOMPARE(Child<FileList>(again, "lstfile")->pattern(), QStringLiteral("*.idx"));
     QCOMPARE(Child<FolderList>(again, "lsttm")->path(), path);
     QCOMPARE(Child<FileList>(again, "lstfile")->path(), path);
     QCOMPARE(Child<QLabel>(again, "txttm")->text(), ShortFolderText(path));
     QCOMPARE(Child<QComboBox>(again, "TyleTXT")->currentText(), QStringLiteral("2000"));
-    QCOMPARE(Child<QLineEdit>(again, "Htxt")->text(), QStringLiteral("1.5"));
-    QCOMPARE(Child<QLineEdit>(again, "txtSoleDC")->text(), QStringLiteral("3"));
-    QCOMPARE(Child<QCheckBox>(again, "fkc")->checkState(), Qt::Checked);
-    QCOMPARE(Child<QCheckBox>(again, "ftd")->checkState(), Qt::Unchecked);
-    QCOMPARE(Child<QCheckBox>(again, "fdc")->checkState(), Qt::Unchecked);
     QCOMPARE(Child<QCheckBox>(again, "fsdo")->checkState(), Qt::PartiallyChecked);
   }
 
   void valuesThatCannotBeAppliedAreSkipped() {
     {
-      QSettings store(QSettings::IniFormat, QSettings::UserScope, Q(kAppTitle), Q(kAppTitle));
-      store.setValue("Settings/KAVU_cbkieu", "x");
-      store.setValue("Settings/KAVU_ckKC", "yes");
-      store.setValue("Settings/KAVU_LstDia", "999");
-      store.setValue("Settings/KAVU_LstTM", "/no/such/folder/anywhere");
-      store.setValue("Settings/KAVU_TyleTXT", "500");
+      Store store;
+      store.setValue(Key("KAVU_cbkieu"), "x");
+      store.setValue(Key("KAVU_ckKC"), "yes");
+      store.setValue(Key("KAVU_LstDia"), "999");
+      store.setValue(Key("KAVU_LstTM"), "/no/such/folder/anywhere");
+      store.setValue(Key("KAVU_TyleTXT"), "500");
     }
     MainWindow w;
     QCOMPARE(Child<QComboBox>(w, "cbkieu")->currentIndex(), 0);
@@ -132,30 +119,26 @@ class SettingsTest : public QObject {
   }
 
   void exitAsksAndNoChangesNothing() {
-    Person person;
-    person.answers = {MsgAnswer::No};
-    MainWindow w;
-    bool ended = false;
-    w.setEndHook([&ended] { ended = true; });
-    w.asker().setHook(person.hook());
+    Desk desk;
+    MainWindow& w = desk.w;
+    const std::vector<Question>& asked = desk.person.asked;
+    desk.person.answers = {MsgAnswer::No};
     w.show();
     QTest::keyClick(&w, Qt::Key_Escape);  // the cancel button is thoat
-    QCOMPARE(person.asked.size(), 1u);
-    QCOMPARE(person.asked[0].text, Q(kExitQuestion));
-    QCOMPARE(person.asked[0].icon, MsgIcon::Question);
-    QCOMPARE(person.asked[0].buttons, MsgButtons::YesNo);
-    QVERIFY(!ended);
+    QCOMPARE(asked.size(), 1u);
+    QCOMPARE(asked[0].text, Q(kExitQuestion));
+    QCOMPARE(asked[0].icon, MsgIcon::Question);
+    QCOMPARE(asked[0].buttons, MsgButtons::YesNo);
+    QVERIFY(!desk.ended);
     QVERIFY(w.isVisible());
     QVERIFY(!IsStored("KAVU_Ftd"));
 
     Child<QComboBox>(w, "TyleTXT")->setCurrentText(QStringLiteral("200"));
     Child<QPushButton>(w, "thoat")->click();  // Yes this time
-    QVERIFY(ended);
+    QVERIFY(desk.ended);
     QCOMPARE(Stored("KAVU_TyleTXT"), QStringLiteral("200"));
     // Written once: a change after the save is not written by the close.
-    QSettings store(QSettings::IniFormat, QSettings::UserScope, Q(kAppTitle), Q(kAppTitle));
-    store.setValue("Settings/KAVU_TyleTXT", "touched");
-    store.sync();
+    Store().setValue(Key("KAVU_TyleTXT"), "touched");
     w.close();
     QCOMPARE(Stored("KAVU_TyleTXT"), QStringLiteral("touched"));
   }

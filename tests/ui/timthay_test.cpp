@@ -17,17 +17,22 @@ using namespace kavu::ui::test;
 class TimthayTest : public QObject {
   Q_OBJECT
 
-  // A find window on one text box, answered by a person.
+  // A find window on one text box with the caret at its start, answered by a
+  // person.
   struct Bench {
     Person person;
     Asker ask;
     QPlainTextEdit text;
     Timthay find{ask, [this](int) { return &text; }};
 
-    explicit Bench(const QString& content) {
+    explicit Bench(const QString& content, const QString& needle = {},
+                   const QString& replacement = {}) {
       ask.setHook(person.hook());
       text.setPlainText(content);
       find.open(1);
+      select(0, 0);
+      type("txttim", needle);
+      type("txtthay", replacement);
     }
     void select(int start, int length) {
       QTextCursor cursor = text.textCursor();
@@ -40,72 +45,57 @@ class TimthayTest : public QObject {
       return text.textCursor().selectionEnd() - text.textCursor().selectionStart();
     }
     void type(const char* name, const QString& value) {
-      find.findChild<QLineEdit*>(QLatin1String(name))->setText(value);
+      Child<QLineEdit>(find, name)->setText(value);
     }
-    void press(const char* name) { find.findChild<QPushButton*>(QLatin1String(name))->click(); }
-    QCheckBox* box(const char* name) { return find.findChild<QCheckBox*>(QLatin1String(name)); }
+    void press(const char* name) { button(name)->click(); }
+    QPushButton* button(const char* name) { return Child<QPushButton>(find, name); }
+    QCheckBox* box(const char* name) { return Child<QCheckBox>(find, name); }
   };
 
  private slots:
   void buttonsWaitForASearchText() {
     Bench bench(QStringLiteral("abc"));
-    for (const char* name : {"tim", "thay1", "thay2"}) {
-      QVERIFY(!bench.find.findChild<QPushButton*>(QLatin1String(name))->isEnabled());
-    }
+    for (const char* name : {"tim", "thay1", "thay2"}) QVERIFY(!bench.button(name)->isEnabled());
     bench.type("txttim", QStringLiteral("b"));
-    for (const char* name : {"tim", "thay1", "thay2"}) {
-      QVERIFY(bench.find.findChild<QPushButton*>(QLatin1String(name))->isEnabled());
+    for (const char* name : {"tim", "thay1", "thay2"}) QVERIFY(bench.button(name)->isEnabled());
+    QVERIFY(bench.button("tim")->isDefault());
+  }
+
+  void aStepSelectsTheNextMatch() {
+    struct Case {
+      const char *text, *needle;
+      int start, length;  // the selection before the step
+      bool matchCase, wholeWord;
+      int found;  // 1-based, 0 when the question is asked
+    };
+    for (const Case& c : {
+             // The search starts one past the caret: the second abc, position 5.
+             Case{"abc abc", "abc", 0, 0, false, false, 5},
+             // Overlapping matches are found one character apart.
+             Case{"xaaa", "aa", 1, 2, false, false, 3},
+             // Case is folded, Vietnamese letters too, unless asked.
+             Case{"x ABC", "abc", 0, 0, false, false, 3},
+             Case{"x ABC", "abc", 0, 0, true, false, 0},
+             Case{"x ĐƯỜNG làng", "đường", 0, 0, false, false, 3},
+             // A whole word skips the end of "concat".
+             Case{"x concat cat", "cat", 0, 0, false, true, 10},
+             Case{"x concat cat", "cat", 0, 0, false, false, 6},
+         }) {
+      Bench bench(Q(c.text), Q(c.needle));
+      bench.select(c.start, c.length);
+      bench.box("chon2")->setChecked(c.matchCase);
+      bench.box("chon1")->setChecked(c.wholeWord);
+      bench.press("tim");
+      QCOMPARE(bench.person.asked.size(), c.found == 0 ? 1u : 0u);
+      if (c.found == 0) continue;
+      QCOMPARE(bench.selStart(), c.found - 1);
+      QCOMPARE(bench.selLength(), static_cast<int>(Q(c.needle).size()));
     }
-    QVERIFY(bench.find.findChild<QPushButton*>("tim")->isDefault());
-  }
-
-  void aMatchAtTheCaretIsPassedOver() {
-    Bench bench(QStringLiteral("abc abc"));
-    bench.select(0, 0);
-    bench.type("txttim", QStringLiteral("abc"));
-    bench.press("tim");
-    QCOMPARE(bench.selStart(), 4);  // position 5
-    QCOMPARE(bench.selLength(), 3);
-    QCOMPARE(bench.person.asked.size(), 0u);
-  }
-
-  void overlappingMatchesAreOneCharacterApart() {
-    Bench bench(QStringLiteral("xaaa"));
-    bench.select(1, 2);
-    bench.type("txttim", QStringLiteral("aa"));
-    QCOMPARE(bench.find.funtim(), 3);
-    QCOMPARE(bench.selStart(), 2);
-  }
-
-  void caseIsFoldedUnlessAsked() {
-    Bench bench(QStringLiteral("x ABC"));
-    bench.type("txttim", QStringLiteral("abc"));
-    QCOMPARE(bench.find.funtim(), 3);
-    bench.select(0, 0);
-    bench.box("chon2")->setChecked(true);
-    bench.person.answers = {MsgAnswer::Yes};
-    QCOMPARE(bench.find.funtim(), 0);
-    QCOMPARE(bench.person.asked.size(), 1u);
-    // Vietnamese letters fold too.
-    Bench vn(Q("x ĐƯỜNG làng"));
-    vn.type("txttim", Q("đường"));
-    QCOMPARE(vn.find.funtim(), 3);
-  }
-
-  void wholeWordSkipsPartsOfWords() {
-    Bench bench(QStringLiteral("x concat cat"));
-    bench.type("txttim", QStringLiteral("cat"));
-    bench.box("chon1")->setChecked(true);
-    QCOMPARE(bench.find.funtim(), 10);
-    bench.box("chon1")->setChecked(false);
-    bench.select(0, 0);
-    QCOMPARE(bench.find.funtim(), 6);
   }
 
   void notFoundAsksAndYesGoesBackToTheTop() {
-    Bench bench(QStringLiteral("abc abc"));
+    Bench bench(QStringLiteral("abc abc"), QStringLiteral("abc"));
     bench.select(5, 0);
-    bench.type("txttim", QStringLiteral("abc"));
     QCOMPARE(bench.find.funtim(), 0);
     QCOMPARE(bench.person.asked.size(), 1u);
     QCOMPARE(bench.person.asked[0].text, Q(kNotFoundAgain));
@@ -116,39 +106,24 @@ class TimthayTest : public QObject {
     QCOMPARE(bench.find.funtim(), 5);  // from the top: the second abc again
   }
 
-  void replaceAll() {
-    Bench bench(QStringLiteral("xaxa"));
-    bench.select(0, 0);
-    bench.type("txttim", QStringLiteral("a"));
-    bench.type("txtthay", QStringLiteral("b"));
-    bench.press("thay2");
-    QCOMPARE(bench.text.toPlainText(), QStringLiteral("xbxb"));
-    QCOMPARE(bench.person.asked.size(), 1u);
-
-    // A match right behind a replacement is passed over.
-    Bench run(QStringLiteral("xaa"));
-    run.select(0, 0);
-    run.type("txttim", QStringLiteral("a"));
-    run.type("txtthay", QStringLiteral("bb"));
-    run.press("thay2");
-    QCOMPARE(run.text.toPlainText(), QStringLiteral("xbba"));
-  }
-
-  void replaceAllWithNothingToFind() {
-    Bench bench(QStringLiteral("abc"));
-    bench.select(0, 0);
-    bench.type("txttim", QStringLiteral("z"));
-    bench.type("txtthay", QStringLiteral("y"));
-    bench.press("thay2");
-    QCOMPARE(bench.text.toPlainText(), QStringLiteral("abc"));
-    QCOMPARE(bench.person.asked.size(), 1u);
+  void replaceAllAsksOnceAtTheEnd() {
+    struct Case {
+      const char *text, *needle, *replacement, *result;
+    };
+    for (const Case& c : {Case{"xaxa", "a", "b", "xbxb"},
+                          // A match right behind a replacement is passed over.
+                          Case{"xaa", "a", "bb", "xbba"},
+                          // Nothing to find: the text stays as it was.
+                          Case{"abc", "z", "y", "abc"}}) {
+      Bench bench(QLatin1String(c.text), QLatin1String(c.needle), QLatin1String(c.replacement));
+      bench.press("thay2");
+      QCOMPARE(bench.text.toPlainText(), QLatin1String(c.result));
+      QCOMPARE(bench.person.asked.size(), 1u);
+    }
   }
 
   void replaceOne() {
-    Bench bench(QStringLiteral("a-a-a"));
-    bench.select(0, 0);
-    bench.type("txttim", QStringLiteral("a"));
-    bench.type("txtthay", Q("ă"));
+    Bench bench(QStringLiteral("a-a-a"), QStringLiteral("a"), Q("ă"));
     bench.press("thay1");
     QCOMPARE(bench.text.toPlainText(), Q("a-ă-a"));
     QCOMPARE(bench.selStart(), 3);  // the caret behind the new text
