@@ -36,13 +36,13 @@ void Station(RunState& st, const std::string& tram, const std::string& ccm,
   incocphu(st);
 }
 
-// The head with heights, then: a station line with its instrument height and
-// two pegs without a check record (the second
-// with a 13-character name, a distance that fills its column and a zenith
-// longer than it: each still set off by a space); a station without pegs
-// (nothing); a station without instrument height, a check record, a peg with spaces around its
-// texts and a note, then an 8-character reading that ends the block; a check record and an
-// 8-character reading on the first peg (station lines only).
+// The head with heights, then: a station with two pegs and no check record
+// (the second with a 13-character name, a distance that fills its column and
+// a zenith longer than it: each still set off by a space); a station without
+// pegs (nothing); a check record, a peg with spaces around its texts and a
+// note, then an 8-character reading that ends the block; a check record and
+// an 8-character reading on the first peg (station lines only). Station lines
+// carry no instrument height.
 TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
   RunState st;
@@ -102,12 +102,6 @@ TEST(Pegs, NothingWhenNotTicked) {
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), "");
   EXPECT_EQ(st.err, 0);
 }
-
-}  // namespace
-}  // namespace kavu
-
-namespace kavu {
-namespace {
 
 RunState RunOn(const std::filesystem::path& fieldBook) {
   RunState st;
