@@ -10,20 +10,9 @@ case "$preset" in
   *) echo "usage: $0 [debug|asan|release]" >&2; exit 64 ;;
 esac
 
-packages=(cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev xvfb xauth python3-ezdxf
-  libbenchmark-dev)
-missing=()
-for p in "${packages[@]}"; do
-  dpkg-query -W -f='${db:Status-Status}' "$p" 2>/dev/null | grep -qx installed || missing+=("$p")
-done
-if ((${#missing[@]})); then
-  sudo=()
-  [ "$(id -u)" -eq 0 ] || sudo=(sudo)
-  echo "Installing: ${missing[*]}"
-  "${sudo[@]}" apt-get update
-  "${sudo[@]}" env DEBIAN_FRONTEND=noninteractive apt-get install -y --no-install-recommends \
-    "${missing[@]}"
-fi
+. tools/ensure-packages.sh
+ensure_packages cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev xvfb xauth \
+  python3-ezdxf libbenchmark-dev fonts-dejavu-core
 
 export CMAKE_GENERATOR=Ninja
 cmake --preset "$preset"
