@@ -52,24 +52,11 @@ class WorkingCopy {
     st_.MangTruong = SplitFields(st_.dong);
     st_.stp = static_cast<int>(st_.MangTruong.size());
   }
-  const std::string& Field0() const {
-    static const std::string kNone;
-    return st_.MangTruong.empty() ? kNone : st_.MangTruong[0];
-  }
 
  private:
   RunState& st_;
   std::size_t next_ = 0;
 };
-
-const std::string& FieldOf(const RunState& st, std::size_t i) {
-  static const std::string kNone;
-  return i < st.MangTruong.size() ? st.MangTruong[i] : kNone;
-}
-
-bool StartsWith(std::string_view text, std::string_view prefix) {
-  return text.substr(0, prefix.size()) == prefix;
-}
 
 // The lengths of the two lists of the regenerated field book stay equal to
 // the count of its lines.
@@ -138,7 +125,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   // An orientation record on the last line leaves the station without a body.
   const bool hasBody = !copy.AtEnd();
   copy.ReadLine();
-  st.TenDiem = copy.Field0();
+  st.TenDiem = st.Field(0);
   st.DiemDau = "";
   st.DiemCuoi = "";
   st.dctdau = 1;
@@ -148,7 +135,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     HandleBodyRecord(st);
     if (copy.AtEnd()) break;
     copy.ReadLine();
-    st.TenDiem = copy.Field0();
+    st.TenDiem = st.Field(0);
   }
   if (st.MangSoLieuASC.size() == bodyStart) DropStationEntries(st, bodyStart - 2);
   st.cpvFile.Line(st.DongTram + "    " + st.DiemDau.str() + " -  " + st.DiemCuoi.str());
@@ -158,16 +145,16 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
 
 void SkipStation(RunState& st, WorkingCopy& copy) {
   st.dctdau = 1;
-  while (copy.Field0() != "TR" && !copy.AtEnd()) {
+  while (st.Field(0) != "TR" && !copy.AtEnd()) {
     copy.ReadLine();
     if (st.dctdau == 1) {
-      st.DiemDau = copy.Field0();
-      st.DiemCuoi = copy.Field0();
+      st.DiemDau = st.Field(0);
+      st.DiemCuoi = st.Field(0);
       st.dctdau = 2;
     } else {
       st.DiemCuoi = st.TenDiem.str();
     }
-    st.TenDiem = copy.Field0();
+    st.TenDiem = st.Field(0);
   }
   st.errFile.Line(std::string(msg::kSkippedFrom) + st.DiemDau.str() + std::string(msg::kSkippedTo) +
                   st.DiemCuoi.str() + std::string(msg::kSkippedEnd));
@@ -178,9 +165,9 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
   st.MangSoLieuSoDo.clear();
   st.MangCocPhu.clear();
-  if (StartsWith(copy.Field0(), "TR") && st.stp >= 2) {
-    st.TenKC = FieldOf(st, 1);
-    st.ccm = FieldOf(st, 2);
+  if (st.Field(0).starts_with("TR") && st.stp >= 2) {
+    st.TenKC = st.Field(1);
+    st.ccm = st.Field(2);
     st.DongTram = st.TenKC.str();
     if (st.stp == 2) {
       ReportError(
@@ -204,12 +191,12 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   } else {
     st.I = 0;
     ReportError(
-        st, std::string(msg::kPointColon) + copy.Field0() + Utf8ToTcvn3(msg::kStationRunTogether));
+        st, std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether));
   }
 
   copy.ReadLine();
-  if (StartsWith(copy.Field0(), "DKD") && st.stp >= 2) {
-    st.TenKC = FieldOf(st, 1);
+  if (st.Field(0).starts_with("DKD") && st.stp >= 2) {
+    st.TenKC = st.Field(1);
     st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);
     st.TenDinhHuong = st.TenKC.str();
@@ -228,7 +215,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     }
   } else {
     st.I = 0;
-    ReportError(st, std::string(msg::kPointColon) + copy.Field0() +
+    ReportError(st, std::string(msg::kPointColon) + st.Field(0) +
                         std::string(msg::kOrientationRunTogether));
   }
 }

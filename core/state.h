@@ -75,6 +75,8 @@ struct ComputationFields {
   std::string dong;
   std::vector<std::string> MangTruong;
   int stp = 0;
+  // Field i of the current record, or the empty text past its last field.
+  const std::string& Field(std::size_t i) const;
 
   // Angle and distance of the current observation.
   double goc = 0, s = 0, rad = 0;

@@ -12,12 +12,6 @@
 namespace kavu {
 namespace {
 
-// Field i of the current record, or the empty text past the last field.
-const std::string& Field(const RunState& st, std::size_t i) {
-  static const std::string kNone;
-  return i < st.MangTruong.size() ? st.MangTruong[i] : kNone;
-}
-
 void EntryError(RunState& st, std::string_view message) {
   ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message));
 }
@@ -26,7 +20,7 @@ void EntryError(RunState& st, std::string_view message) {
 // be computed: it is reported and passed over.
 bool NumbersMissing(RunState& st, std::initializer_list<std::size_t> fields) {
   for (std::size_t i : fields) {
-    if (!HasNumber(Field(st, i))) {
+    if (!HasNumber(st.Field(i))) {
       EntryError(st, msg::kNotANumber);
       return true;
     }
@@ -140,11 +134,11 @@ void STP5(RunState& st) {
   } else {
     st.DiemCuoi = st.TenDiem.str();
   }
-  st.s = Val(Field(st, 2));
-  st.goc = Val(Field(st, 3));
-  st.ccg = Val(Field(st, 4));
+  st.s = Val(st.Field(2));
+  st.goc = Val(st.Field(3));
+  st.ccg = Val(st.Field(4));
   TinhDoCao(st);
-  st.goc = Val(Field(st, 1));
+  st.goc = Val(st.Field(1));
   TinhToaDo(st);
   GhiMangToaDoChiTiet(st);
   GhiMangSoLieuToaDo(st);
@@ -152,10 +146,10 @@ void STP5(RunState& st) {
 }
 
 void STP6(RunState& st) {
-  st.TenKC = Field(st, 5);
+  st.TenKC = st.Field(5);
   if (st.TenKC == st.TenTram || st.TenKC == st.TenDinhHuong) {
     // An orientation distance record: only the distance counts.
-    st.s = Val(Field(st, 2));
+    st.s = Val(st.Field(2));
     if (st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
       ReportError(st, std::string(msg::kStation) + st.TenTram.str() +
                           Utf8ToTcvn3(msg::kOrientation) + st.TenDinhHuong.str() +
@@ -166,29 +160,29 @@ void STP6(RunState& st) {
   }
   if (NumbersMissing(st, {1, 3, 4})) return;
   st.MangSoLieuASC.push_back(st.dong);
-  st.s = Val(Field(st, 2));
-  st.goc = Val(Field(st, 3));
-  st.ccg = Val(Field(st, 4));
+  st.s = Val(st.Field(2));
+  st.goc = Val(st.Field(3));
+  st.ccg = Val(st.Field(4));
   TinhDoCao(st);
-  st.goc = Val(Field(st, 1));
+  st.goc = Val(st.Field(1));
   TinhToaDo(st);
   // The peg becomes a known point for the rest of the run.
   st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
   std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
-  if (st.stp > 6) line += " " + Field(st, 6);
+  if (st.stp > 6) line += " " + st.Field(6);
   st.ChuoiKC += line + "\r\n";
-  st.MangCocPhu.push_back({"", Field(st, 5), Field(st, 1), Field(st, 2), Field(st, 3), Field(st, 4),
-                           st.stp > 6 ? Field(st, 6) : std::string()});
+  st.MangCocPhu.push_back({"", st.Field(5), st.Field(1), st.Field(2), st.Field(3), st.Field(4),
+                           st.stp > 6 ? st.Field(6) : std::string()});
 }
 
 void STP7(RunState& st) {
   if (NumbersMissing(st, {1})) return;
-  st.TenKC = Field(st, 5);
+  st.TenKC = st.Field(5);
   st.TenDinhHuong2 = st.TenKC.str();
   st.DongDinhHuong2 = "DKD2 " + st.TenKC.str();
   // The record's own distance is the one checked.
-  st.s = Val(Field(st, 2));
-  st.goc = Val(Field(st, 1));
+  st.s = Val(st.Field(2));
+  st.goc = Val(st.Field(1));
   gocdo(st);
   st.pv2 = st.goc;
   TimToaDoDiem(st);
@@ -214,9 +208,9 @@ void STP7(RunState& st) {
     st.StSaiGoc.clear();
     st.StXDinhHuong2.clear();
     st.StYDinhHuong2.clear();
-    st.DongDinhHuong2 += " " + Field(st, 1);
-  } else if (Val(Trim(Field(st, 1))) != 0) {
-    st.DongDinhHuong2 += " " + Field(st, 1);
+    st.DongDinhHuong2 += " " + st.Field(1);
+  } else if (Val(Trim(st.Field(1))) != 0) {
+    st.DongDinhHuong2 += " " + st.Field(1);
   } else {
     // No reading was recorded: make one from the computed angle, within half
     // a minute of it.
@@ -234,7 +228,7 @@ void STP7(RunState& st) {
     st.StGoc = Trim(Mask(Val(st.StGoc), "#######"));
     st.DongDinhHuong2 += " " + st.StGoc;
   }
-  st.DongDinhHuong2 += " " + Field(st, 2);
+  st.DongDinhHuong2 += " " + st.Field(2);
 }
 
 }  // namespace kavu

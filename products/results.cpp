@@ -7,26 +7,21 @@
 namespace kavu {
 namespace {
 
-std::string& Field(RunState& st, std::size_t i) {
-  if (st.MangTruong.size() <= i) st.MangTruong.resize(i + 1);
-  return st.MangTruong[i];
-}
-
 std::string PrismText(double ccg) { return RString(Mask(ccg, "####.000"), 10); }
 
 }  // namespace
 
 bool DescriptiveWords(RunState& st) {
-  if (st.stp < 6) return false;
-  std::string& code = Field(st, 5);
+  if (st.stp < 6 || st.MangTruong.size() < 6) return false;
+  std::string& code = st.MangTruong[5];
   return KTraCCG(code) == 0 || code.size() <= 2;
 }
 
 void GhiMangToaDoChiTiet(RunState& st) {
   const bool words = (st.stp == 6 || st.stp == 7) && DescriptiveWords(st);
   st.MangToaDoChiTiet.push_back({st.TenDiem.str(), st.StX.str(), st.StY.str(), st.StZ.str(),
-                                 words ? Field(st, 5) : std::string(),
-                                 words && st.stp == 7 ? Field(st, 6) : std::string()});
+                                 words ? st.Field(5) : std::string(),
+                                 words && st.stp == 7 ? st.Field(6) : std::string()});
 }
 
 void GhiMangSoLieuToaDo(RunState& st) {
@@ -35,8 +30,8 @@ void GhiMangSoLieuToaDo(RunState& st) {
   if (st.stp >= 5 && st.stp <= 7 && (st.stp == 5 || DescriptiveWords(st))) {
     line = LString(Trim(st.TenDiem.str()), 5) + RString(st.StX.str(), 12) +
            RString(st.StY.str(), 12) + RString(st.StZ.str(), 12) + PrismText(st.ccg);
-    if (st.stp >= 6) line += " " + Field(st, 5);
-    if (st.stp == 7) line += " " + Field(st, 6);
+    if (st.stp >= 6) line += " " + st.Field(5);
+    if (st.stp == 7) line += " " + st.Field(6);
   }
   if (!st.MangSoLieuToaDo.empty()) st.MangSoLieuToaDo.back() = line;
 }
@@ -47,8 +42,8 @@ void GhiMangSoLieuVaoSoDo(RunState& st) {
     note = std::string(12, ' ');
   } else if (st.stp == 6 || st.stp == 7) {
     if (st.goc == 0 || DescriptiveWords(st)) {
-      note = Field(st, 5);
-      if (st.stp == 7) note += " " + Field(st, 6);
+      note = st.Field(5);
+      if (st.stp == 7) note += " " + st.Field(6);
     }
   }
   st.MangSoLieuSoDo.push_back(
