@@ -41,6 +41,7 @@ class RecordingHost : public Host {
   std::string fileBox;
   int kind = -1;
   int beeps = 0;
+  int focused = 0;
 
   MsgAnswer MessageBox(std::string_view text, MsgIcon, MsgButtons buttons) override {
     messages.emplace_back(text);
@@ -49,7 +50,7 @@ class RecordingHost : public Host {
   void SetTitle(std::string_view title) override { titles.emplace_back(title); }
   void Beep() override { ++beeps; }
   void SetFileBox(std::string_view text) override { fileBox = text; }
-  void FocusFileBox() override {}
+  void FocusFileBox() override { ++focused; }
   void SelectKind(int index) override { kind = index; }
 };
 

@@ -108,9 +108,13 @@ TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
   const fs::path folder = FreshFolder();
   RecordingHost host;
 
+  // Every refused choice leaves the file box empty with the focus in it, so
+  // the user can type the next name at once.
   RunState none;
+  host.fileBox = "typed";
   EXPECT_EQ(tinh_Click(none, host).outcome, RunOutcome::NotStarted);
   EXPECT_EQ(host.messages.back(), msg::kNoFileChosen);
+  EXPECT_EQ(host.fileBox, "");
 
   RunState missing = StateFor(folder / "nothing.asc");
   host.fileBox = "x";
@@ -126,6 +130,8 @@ TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
   EXPECT_EQ(tinh_Click(empty, host).outcome, RunOutcome::NotStarted);
   EXPECT_EQ(host.messages.back(),
             std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
+  EXPECT_EQ(empty.txtfile, "");
+  EXPECT_EQ(host.focused, 3);
 
   // A kind without converter needs the field book of the same base name.
   WriteBytes(folder / "job.raw", "raw data\r\n");

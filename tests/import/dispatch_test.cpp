@@ -73,28 +73,5 @@ TEST(CheckAndConvert, KindComesFromTheExtensionUnlessOverriddenAndHeaderIsCut) {
   EXPECT_EQ(*CheckAndConvert(told, host), std::vector<std::string>{"anything"});
 }
 
-// Every refused choice leaves the file box empty with the focus in it, so the
-// user can type the next name at once; the empty box included.
-TEST(CheckAndConvert, RefusedFileLeavesTheFileBoxEmptyAndFocused) {
-  struct FocusHost : testing::RecordingHost {
-    int focused = 0;
-    void FocusFileBox() override { ++focused; }
-  };
-  const fs::path folder = testing::FreshFolder();
-  testing::WriteBytes(folder / "empty.asc", "");
-  for (const std::string& path :
-       {std::string(), (folder / "none.asc").string(), (folder / "empty.asc").string()}) {
-    FocusHost host;
-    host.fileBox = "typed";
-    RunState st;
-    st.txtfile = path;
-    EXPECT_FALSE(CheckAndConvert(st, host)) << path;
-    EXPECT_EQ(host.messages.size(), 1u) << path;
-    EXPECT_EQ(host.fileBox, "") << path;
-    EXPECT_EQ(st.txtfile, "") << path;
-    EXPECT_GE(host.focused, 1) << path;
-  }
-}
-
 }  // namespace
 }  // namespace kavu

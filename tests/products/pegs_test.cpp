@@ -36,6 +36,16 @@ void Station(RunState& st, const std::string& tram, const std::string& ccm,
   incocphu(st);
 }
 
+// A state whose peg file is open, with the control points read.
+RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
+  RunState st;
+  st.fcp = fcp;
+  st.fdc = fdc;
+  st.MangKhongChe = kControl;
+  st.cpFile.open(folder / "JOB1.cp");
+  return st;
+}
+
 // The head with heights, then: a station with two pegs and no check record
 // (the second with a 13-character name, a distance that fills its column and
 // a zenith longer than it: each still set off by a space); a station without
@@ -45,11 +55,7 @@ void Station(RunState& st, const std::string& tram, const std::string& ccm,
 // carry no instrument height.
 TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
-  RunState st;
-  st.fcp = 1;
-  st.fdc = 1;
-  st.MangKhongChe = kControl;
-  st.cpFile.open(folder / "JOB1.cp");
+  RunState st = PegState(folder, 1, 1);
   st.errFile.open(folder / "JOB1.err");
 
   WritePegFileHead(st);
@@ -79,11 +85,7 @@ TEST(Pegs, HeadAndStationBlocks) {
 
 TEST(Pegs, HeadWithoutHeights) {
   const auto folder = FreshFolder();
-  RunState st;
-  st.fcp = 1;
-  st.fdc = 0;
-  st.MangKhongChe = kControl;
-  st.cpFile.open(folder / "JOB1.cp");
+  RunState st = PegState(folder, 1, 0);
   WritePegFileHead(st);
   ASSERT_TRUE(st.cpFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/head_without_heights.cp"));
@@ -92,10 +94,7 @@ TEST(Pegs, HeadWithoutHeights) {
 // Without the box ticked nothing is written and nothing is checked.
 TEST(Pegs, NothingWhenNotTicked) {
   const auto folder = FreshFolder();
-  RunState st;
-  st.fcp = 0;
-  st.MangKhongChe = kControl;
-  st.cpFile.open(folder / "JOB1.cp");
+  RunState st = PegState(folder, 0, 1);
   WritePegFileHead(st);
   Station(st, "ST1", "1.45", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
   ASSERT_TRUE(st.cpFile.close());

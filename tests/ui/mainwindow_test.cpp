@@ -83,18 +83,6 @@ class MainWindowTest : public QObject {
     QCOMPARE(files->count(), 3);
   }
 
-  void aDotInAFolderNameDoesNotRenameTheProducts() {
-    Desk desk;
-    QVERIFY(QDir(desk.work.path()).mkpath(QStringLiteral("My.Data")));
-    const QString folder = Native(desk.path("My.Data"));
-    WriteAll(folder + QStringLiteral("/job1.asc"), "x");
-    desk.w.show();
-    QVERIFY(Child<FolderList>(desk.w, "lsttm")->setPath(folder));
-    QVERIFY(ClickFile(desk.w, QStringLiteral("job1.asc")));
-    QCOMPARE(Q(desk.w.state().daufile), folder + Sep() + QStringLiteral("job1"));
-    QCOMPARE(Q(desk.w.state().duoifile), QStringLiteral("asc"));
-  }
-
   void aComputeEndsWithTheSummary() {
     Desk desk;
     MainWindow& w = desk.w;
