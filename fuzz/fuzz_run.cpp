@@ -18,6 +18,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   {
     kavu::TextOut out(folder / "job.asc");
     out.Write(std::string(reinterpret_cast<const char*>(data), size));
+    out.commit();
   }
   kavu::RunState st;
   st.txtfile = (folder / "job.asc").string();

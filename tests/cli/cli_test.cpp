@@ -240,9 +240,9 @@ TEST(Cli, KindFromTheExtensionOrTheOption) {
   WriteBytes(dir / "job.asc", kSmallBook);
   WriteBytes(dir / "job.dat", "anything");
   // A kind without converter computes the field book of the same base name;
-  // told it is a field book, the file itself is computed.
+  // told it is a field book, the file itself is read (it has no station).
   EXPECT_EQ(Cli({(dir / "job.dat").string()}).code, kExitOk);
-  EXPECT_EQ(Cli({"--kind", "0", (dir / "job.dat").string()}).code, kExitOk);
+  EXPECT_EQ(Cli({"--kind", "0", (dir / "job.dat").string()}).code, kExitStopped);
 }
 
 // Without heights a control-coordinate line ends after Y: "TR name X Y".

@@ -72,6 +72,7 @@ TEST(ConvertIdx, BadInputEndsWithABoundedFieldBook) {
 // geoeasy-test.idx declares ANGULAR DMS: 18 set-ups with INST_HT 0.000000,
 // each oriented on "2000"; 160 lines inside its SLOPE sections.
 TEST(ConvertIdx, RealKeywordFile) {
+  KAVU_SKIP_WITHOUT_REALDATA();
   const std::string book = ConvertIdx(RealData("geoeasy-test.idx"));
   const std::vector<std::string> lines = SplitLines(book);
   ASSERT_EQ(lines.size(), 18u + 18u + 160u);

@@ -48,6 +48,7 @@ TEST(ObsConversion, IncompleteBlocksStillEnd) {
 }
 
 TEST(ObsRealData, Sdr33JobWithSixteenCharacterFields) {
+  KAVU_SKIP_WITHOUT_REALDATA();
   const std::string book = ConvertObs(RealData("geoeasy-20151125.obs"), 2);
   // Its known points are all computed (08CO): no control-point records.
   EXPECT_TRUE(

@@ -63,6 +63,7 @@ TEST(SdrConversion, IncompleteBlocksStillEnd) {
 }
 
 TEST(SdrRealData, Sdr2xJobWithFourCharacterIds) {
+  KAVU_SKIP_WITHOUT_REALDATA();
   const std::string book = ConvertSdr(RealData("barnes-example.sdr"), 1);
   EXPECT_EQ(CountStarting(book, "TR "), 5);
   EXPECT_EQ(CountStarting(book, "DKD "), 5);
@@ -82,6 +83,7 @@ TEST(SdrRealData, Sdr2xJobWithFourCharacterIds) {
 }
 
 TEST(SdrRealData, CollectorJobWithOtherSetUpCodesEnds) {
+  KAVU_SKIP_WITHOUT_REALDATA();
   // Its set-ups are 02KI/07KI with 16-character fields: as an .sdr it yields
   // control points and observations but no station.
   const std::string book = ConvertSdr(RealData("geoeasy-focus6-1.sdr"), 1);
