@@ -197,13 +197,17 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
 
   // One run of a job at a time; what a killed run left is removed.
   if (jobLock != nullptr) {
-    const std::string lockPath = st.daufile + ".lock";
-    if (jobLock->Acquire(lockPath) == FileLock::Result::Busy) {
-      host.MessageBox(std::string(msg::kBeingComputed) + st.filesl, MsgIcon::Critical,
-                      MsgButtons::Ok);
-      return std::nullopt;
+    switch (jobLock->Acquire(st.daufile + ".lock")) {
+      case FileLock::Result::Busy:
+        host.MessageBox(std::string(msg::kBeingComputed) + st.filesl, MsgIcon::Critical,
+                        MsgButtons::Ok);
+        return std::nullopt;
+      case FileLock::Result::Taken:
+        RemoveLeftovers(st);
+        break;
+      case FileLock::Result::Unavailable:  // a read-only folder: no lock, nothing to remove
+        break;
     }
-    RemoveLeftovers(st);
   }
 
   std::optional<std::string> content;
