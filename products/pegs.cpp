@@ -14,14 +14,9 @@ constexpr std::size_t kLongestReading = 7;
 // The observation columns of a peg line are 8 characters wide.
 constexpr int kColumn = 8;
 
-// A value right-aligned in its column. A value that fills the column gets a
-// space in front, so that it never runs into the value before it and the
-// line can still be read back as a field book.
-std::string Column(const std::string& value) {
-  std::string text = RString(value, kColumn);
-  if (text.empty() || text.front() != ' ') text.insert(0, 1, ' ');
-  return text;
-}
+// A value right-aligned in its column, never running into the one before it,
+// so the line can still be read back as a field book.
+std::string Column(const std::string& value) { return NumberColumn(value, kColumn); }
 
 }  // namespace
 
