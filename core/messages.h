@@ -76,6 +76,11 @@ inline constexpr std::string_view kCpvHeader[] = {
     "-------------------------------------------------------------",
 };
 
+// Error report: observations and names that cannot be computed as written.
+inline constexpr std::string_view kNoDistance = " khong co khoang cach";
+inline constexpr std::string_view kWrongZenith = " nhap sai goc dung";
+inline constexpr std::string_view kNameTooLong = " ten dai qua 12 ky tu";
+
 // Files that the run must not lose.
 inline constexpr std::string_view kProductIsInput = " (trùng File đầu vào)";
 inline constexpr std::string_view kConversionOverInput =

@@ -81,11 +81,14 @@ double PowerOfTen(int n) {
   return p;
 }
 
-// The value's decimal digits without sign (an integral, finite, non-negative
-// value).
-std::string WholeDigits(double whole) {
+constexpr double kTwoTo53 = 9007199254740992.0;
+
+// The exact decimal text of a finite, non-negative value with the given
+// number of decimals.
+std::string FixedDigits(double value, int decimals) {
   char buf[400];
-  const auto [ptr, ec] = std::to_chars(buf, buf + sizeof buf, whole, std::chars_format::fixed, 0);
+  const auto [ptr, ec] =
+      std::to_chars(buf, buf + sizeof buf, value, std::chars_format::fixed, decimals);
   if (ec != std::errc()) return "0";
   return std::string(buf, ptr);
 }
@@ -121,16 +124,27 @@ std::string Mask(double x, std::string_view mask) {
   const std::string_view frac_mask =
       point == std::string_view::npos ? std::string_view() : mask.substr(point + 1);
   const std::size_t decimals = frac_mask.size();
+  // A value that is no number at all must not pass for one: a run of stars
+  // as wide as the mask, which reads back as no number.
+  if (!std::isfinite(x)) return std::string(mask.size(), '*');
 
   std::size_t min_int = 0;
   for (const char c : int_mask) min_int += c == '0' ? 1 : 0;
 
-  double y = x * PowerOfTen(static_cast<int>(decimals));
-  if (!std::isfinite(y)) y = 0;
-  y = std::round(y);  // half away from zero
-  const bool negative = y < 0;
-
-  std::string digits = WholeDigits(std::fabs(y));
+  bool negative = false;
+  std::string digits;  // the digits of |x| scaled by 10^decimals, rounded
+  const double y = x * PowerOfTen(static_cast<int>(decimals));
+  if (std::fabs(y) < kTwoTo53) {
+    const double whole = std::round(y);  // half away from zero
+    negative = whole < 0;
+    digits = FixedDigits(std::fabs(whole), 0);
+  } else {
+    // Beyond 2^53 the scaled value is no longer exact: the value's own
+    // decimal expansion is written, to the mask's decimals.
+    negative = x < 0;
+    digits = FixedDigits(std::fabs(x), static_cast<int>(decimals));
+    std::erase(digits, '.');
+  }
   if (digits.size() < decimals + 1) digits.insert(0, decimals + 1 - digits.size(), '0');
   std::string int_part = digits.substr(0, digits.size() - decimals);
   std::string frac_part = digits.substr(digits.size() - decimals);

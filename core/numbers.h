@@ -29,7 +29,9 @@ double Fix(double x);
 
 // Number masks ("##0", "00", "0000000", "####0.000", "#######.000"...):
 // x·10^d rounded half away from zero; "0" digits always written, "#" digits
-// only when significant; no minus sign on a zero result.
+// only when significant; no minus sign on a zero result. Where x·10^d is not
+// below 2^53 the exact decimal text of x itself is written, to d decimals; a
+// value that is not finite gives stars as wide as the mask.
 std::string Mask(double x, std::string_view mask);
 
 // Ordinary number text: at most 15 significant digits, exponent form below

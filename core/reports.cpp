@@ -21,9 +21,9 @@ void WriteStationListingHeader(TextOut& out) {
 
 std::string CoordinateTextLine(const RunState& st, int k, int decimals) {
   const DetailPoint& p = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
-  const std::string height = RString(NumberText(RoundEven(Val(p[3]), decimals)), 10);
-  return FixedWidth(p[0].substr(0, 5), 5) + " " + FixedWidth(p[1], 11) + " " +
-         FixedWidth(p[2], 10) + " " + height + " " + p[4] + " " + p[5];
+  const std::string height = NumberColumn(NumberText(RoundEven(Val(p[3]), decimals)), 10);
+  return FixedWidth(p[0].substr(0, 5), 5) + " " + NumberWidth(p[1], 11) + " " +
+         NumberWidth(p[2], 10) + " " + height + " " + p[4] + " " + p[5];
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {

@@ -167,10 +167,12 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.MangSoLieuSoDo.clear();
   st.MangCocPhu.clear();
   if (st.Field(0).starts_with("TR") && st.stp >= 2) {
+    ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
     st.ccm = st.Field(2);
     st.DongTram = st.TenKC.str();
-    if (st.stp == 2) {
+    // A height that is no number is as good as none: computed with 0.
+    if (!HasNumber(st.ccm)) {
       ReportError(
           st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
     }
@@ -197,6 +199,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
 
   copy.ReadLine();
   if (st.Field(0).starts_with("DKD") && st.stp >= 2) {
+    ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
     st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);

@@ -110,9 +110,10 @@ struct ComputationFields {
   double xi = 0, yi = 0, zi = 0;
   double pv2 = 0, scgcd = 0;
   double X = 0, Y = 0, Z = 0;
-  FixedText<11> StX;
-  FixedText<10> StY, StZ;
-  FixedText<8> StS, StCanh;
+  // Coordinate and distance texts are padded to their widths, never cut.
+  FixedNumber<11> StX;
+  FixedNumber<10> StY, StZ;
+  FixedNumber<8> StS, StCanh;
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;

@@ -16,8 +16,8 @@ void EntryError(RunState& st, std::string_view message) {
   ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message));
 }
 
-// A record whose reading, zenith angle or prism height holds no number cannot
-// be computed: it is reported and passed over.
+// A record whose reading, distance, zenith angle or prism height holds no
+// number cannot be computed: it is reported and passed over.
 bool NumbersMissing(RunState& st, std::initializer_list<std::size_t> fields) {
   for (std::size_t i : fields) {
     if (!HasNumber(st.Field(i))) {
@@ -26,6 +26,50 @@ bool NumbersMissing(RunState& st, std::initializer_list<std::size_t> fields) {
     }
   }
   return false;
+}
+
+// The packed angle split into degrees, minutes and seconds as gocdo reads it:
+// integer division and remainder work on the angle rounded to a whole number.
+// The degrees are not yet reduced below 360.
+AngleParts SplitPacked(double goc) {
+  const double whole = RoundEvenWhole(goc);
+  AngleParts parts;
+  parts.do1 = std::trunc(whole / 10000);
+  parts.phut = static_cast<std::int16_t>(std::trunc(std::fmod(whole, 10000) / 100));
+  parts.giay = RoundEven((goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
+  return parts;
+}
+
+double PartsDegrees(const AngleParts& parts) {
+  return (parts.do1 + parts.phut / 60.0) + parts.giay / 3600;
+}
+
+// The zenith angle of the record (field 3) in degrees, decoded as the height
+// computation decodes it.
+double ZenithDegrees(const RunState& st) {
+  AngleParts parts = SplitPacked(std::fabs(Val(st.Field(3))));
+  if (parts.do1 >= 360) parts.do1 = std::fmod(parts.do1, 360);
+  return PartsDegrees(parts);
+}
+
+// The checks of a detail or peg observation before it is computed. A record
+// without a usable distance (an angle-only observation) or, when heights are
+// wanted, with a zenith angle that cannot give one, would put a false point
+// into the products: it is reported once and passed over.
+bool ObservationUsable(RunState& st) {
+  if (NumbersMissing(st, {1, 2, 3, 4})) return false;
+  if (Val(st.Field(2)) == 0) {
+    EntryError(st, msg::kNoDistance);
+    return false;
+  }
+  if (Ticked(st.fdc)) {
+    const double zenith = ZenithDegrees(st);
+    if (!(zenith > 0 && zenith < 180)) {
+      EntryError(st, msg::kWrongZenith);
+      return false;
+    }
+  }
+  return true;
 }
 
 // Azimuth and distance from (xFrom, yFrom) to the station, reported against
@@ -68,20 +112,18 @@ void gocdo(RunState& st) {
     st.s = std::fabs(st.s);
     EntryError(st, msg::kNegativeDistance);
   }
-  // Integer division and remainder work on the angle rounded to a whole number.
-  const double whole = RoundEvenWhole(st.goc);
-  st.do1 = std::trunc(whole / 10000);
-  const double minutesAndSeconds = std::fmod(whole, 10000);
-  st.phut = static_cast<std::int16_t>(std::trunc(minutesAndSeconds / 100));
-  st.giay = RoundEven((st.goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
-  if (st.do1 >= 360) {
+  AngleParts parts = SplitPacked(st.goc);
+  if (parts.do1 >= 360) {
     EntryError(st, msg::kWrongDegrees);
-    st.do1 = std::fmod(st.do1, 360);
+    parts.do1 = std::fmod(parts.do1, 360);
   }
-  if (st.phut >= 60) EntryError(st, msg::kWrongMinutes);
-  if (st.giay >= 60) EntryError(st, msg::kWrongSeconds);
+  if (parts.phut >= 60) EntryError(st, msg::kWrongMinutes);
+  if (parts.giay >= 60) EntryError(st, msg::kWrongSeconds);
   if (st.s > 2000 || st.s < 0) EntryError(st, msg::kDistanceMayBeWrong);
-  st.goc = (st.do1 + st.phut / 60.0) + st.giay / 3600;
+  st.do1 = parts.do1;
+  st.phut = parts.phut;
+  st.giay = parts.giay;
+  st.goc = PartsDegrees(parts);
   st.rad = st.goc * kPi / 180;
 }
 
@@ -124,8 +166,15 @@ void TinhToaDo(RunState& st) {
   st.StS = Mask(st.s, "#####.000");
 }
 
+void ReportLongName(RunState& st, std::string_view name) {
+  if (name.size() > decltype(st.TenDiem)::kWidth) {
+    ReportError(st, std::string(msg::kPoint) + std::string(name) + std::string(msg::kNameTooLong));
+  }
+}
+
 void STP5(RunState& st) {
-  if (NumbersMissing(st, {1, 3, 4})) return;
+  ReportLongName(st, st.Field(0));
+  if (!ObservationUsable(st)) return;
   st.MangSoLieuASC.push_back(st.dong);
   if (st.dctdau == 1) {
     st.DiemDau = st.TenDiem.str();
@@ -148,9 +197,11 @@ void STP5(RunState& st) {
 void STP6(RunState& st) {
   st.TenKC = st.Field(5);
   if (st.TenKC == st.TenTram || st.TenKC == st.TenDinhHuong) {
-    // An orientation distance record: only the distance counts.
+    // An orientation distance record: only the distance counts. A shot
+    // without a distance (blank, not a number or 0) has nothing to check.
     st.s = Val(st.Field(2));
-    if (st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
+    const bool measured = HasNumber(st.Field(2)) && st.s != 0;
+    if (measured && st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
       ReportError(st, std::string(msg::kStation) + st.TenTram.str() +
                           Utf8ToTcvn3(msg::kOrientation) + st.TenDinhHuong.str() +
                           std::string(msg::kWrongOrientationDistance) + std::string(msg::kDS) +
@@ -158,7 +209,8 @@ void STP6(RunState& st) {
     }
     return;
   }
-  if (NumbersMissing(st, {1, 3, 4})) return;
+  ReportLongName(st, st.Field(5));
+  if (!ObservationUsable(st)) return;
   st.MangSoLieuASC.push_back(st.dong);
   st.s = Val(st.Field(2));
   st.goc = Val(st.Field(3));
@@ -176,7 +228,7 @@ void STP6(RunState& st) {
 }
 
 void STP7(RunState& st) {
-  if (NumbersMissing(st, {1})) return;
+  if (NumbersMissing(st, {1, 2})) return;
   st.TenKC = st.Field(5);
   st.TenDinhHuong2 = st.TenKC.str();
   st.DongDinhHuong2 = "DKD2 " + st.TenKC.str();

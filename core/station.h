@@ -18,6 +18,10 @@ void TinhDoCao(RunState& st);
 // Plane coordinates of the current point.
 void TinhToaDo(RunState& st);
 
+// A name longer than its 12-character field is reported (in full) before the
+// field cuts it.
+void ReportLongName(RunState& st, std::string_view name);
+
 void STP5(RunState& st);  // detail record
 void STP6(RunState& st);  // peg or orientation distance record
 void STP7(RunState& st);  // check record

@@ -25,6 +25,12 @@ std::string FixedWidth(std::string_view text, std::size_t width) {
   return out;
 }
 
+std::string NumberWidth(std::string_view text, std::size_t width) {
+  std::string out(text);
+  if (out.size() < width) out.resize(width, ' ');
+  return out;
+}
+
 namespace {
 
 // The decision is taken on the untrimmed length, the padding on the trimmed
@@ -41,6 +47,12 @@ std::string Align(std::string_view text, int width, bool right) {
 std::string RString(std::string_view text, int width) { return Align(text, width, true); }
 
 std::string LString(std::string_view text, int width) { return Align(text, width, false); }
+
+std::string NumberColumn(std::string_view text, int width) {
+  std::string out = RString(TrimView(text), width);
+  if (out.empty() || out.front() != ' ') out.insert(0, 1, ' ');
+  return out;
+}
 
 int KTraCCG(std::string& text) {
   text = Trim(text);

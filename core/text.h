@@ -20,6 +20,15 @@ std::string Upper(std::string_view text);
 // the width.
 std::string FixedWidth(std::string_view text, std::size_t width);
 
+// A number in a fixed-width field: left-aligned and padded like FixedWidth,
+// but a longer number is kept whole (a number is never cut to fit).
+std::string NumberWidth(std::string_view text, std::size_t width);
+
+// A number right-aligned in a column of a record line (RString of the trimmed
+// text); one that fills or exceeds the column gets one space in front, so it
+// never runs into the value before it and the line still splits into fields.
+std::string NumberColumn(std::string_view text, int width);
+
 // RString / LString: when text is shorter than width, the trimmed text padded
 // to exactly width (spaces in front / behind); otherwise text unchanged.
 std::string RString(std::string_view text, int width);
@@ -30,12 +39,14 @@ std::string LString(std::string_view text, int width);
 int KTraCCG(std::string& text);
 
 // A fixed-width text field of the computation state (names 12, X 11, Y 10...).
-template <std::size_t N>
+// A name is cut to the width; a number (Cut = false) is only padded.
+template <std::size_t N, bool Cut = true>
 class FixedText {
  public:
+  static constexpr std::size_t kWidth = N;
   FixedText() : value_(N, ' ') {}
   FixedText& operator=(std::string_view text) {
-    value_ = FixedWidth(text, N);
+    value_ = Cut ? FixedWidth(text, N) : NumberWidth(text, N);
     return *this;
   }
   const std::string& str() const { return value_; }
@@ -45,6 +56,9 @@ class FixedText {
  private:
   std::string value_;
 };
+
+template <std::size_t N>
+using FixedNumber = FixedText<N, false>;
 
 // tachdong: every tab turned into a space, runs of spaces reduced to one; the
 // normalised text written back into line; the fields returned. The caller has

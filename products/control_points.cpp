@@ -4,6 +4,7 @@
 #include <system_error>
 
 #include "core/messages.h"
+#include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
 #include "products/pegs.h"
@@ -25,6 +26,7 @@ bool IsControlRecord(const std::vector<std::string>& fields) {
 }
 
 void AddControlPoint(RunState& st, const std::vector<std::string>& fields) {
+  ReportLongName(st, fields[1]);
   const bool withHeight = Ticked(st.fdc) && fields.size() >= 5;
   st.MangKhongChe.push_back({fields[1], fields[2], fields[3], withHeight ? fields[4] : ""});
 }

@@ -25,6 +25,25 @@ void AppendControlLine(RunState& st) {
   st.ChuoiKC += "\r\n";
 }
 
+// Whether ChuoiKC already holds a line for the point: the name field of each
+// line (after "TR "), trimmed, is compared whole, so that "3" is not found in
+// the line of "1003".
+bool ChuoiKCHas(std::string_view chuoi, std::string_view name) {
+  constexpr std::string_view kHead = "TR ";
+  constexpr std::size_t kNameWidth = decltype(RunState::TenKC)::kWidth;
+  std::size_t start = 0;
+  while (start < chuoi.size()) {
+    std::size_t end = chuoi.find("\r\n", start);
+    if (end == std::string_view::npos) end = chuoi.size();
+    const std::string_view line = chuoi.substr(start, end - start);
+    if (line.starts_with(kHead) && TrimView(line.substr(kHead.size(), kNameWidth)) == name) {
+      return true;
+    }
+    start = end + 2;
+  }
+  return false;
+}
+
 void TakeCoordinates(RunState& st) {
   st.X = RoundEven(Val(st.StX.str()), 3);
   st.Y = RoundEven(Val(st.StY.str()), 3);
@@ -46,7 +65,7 @@ void TimToaDoDiem(RunState& st) {
     st.StX = point[1];
     st.StY = point[2];
     st.StZ = point[3];
-    if (st.ChuoiKC.find(st.TenKC.str()) == std::string::npos) AppendControlLine(st);
+    if (!ChuoiKCHas(st.ChuoiKC, name)) AppendControlLine(st);
     if (st.n > 1) {
       const double x = RoundEven(Val(st.StX.str()), 3);
       const double y = RoundEven(Val(st.StY.str()), 3);

@@ -11,17 +11,10 @@ namespace {
 
 // A packed angle of more than 7 characters cannot be a DDDMMSS reading.
 constexpr std::size_t kLongestReading = 7;
-// The observation columns of a peg line are 8 characters wide.
+// The observation columns of a peg line are 8 characters wide; a value never
+// runs into the one before it, so the line can still be read back as a field
+// book.
 constexpr int kColumn = 8;
-
-// A value right-aligned in its column. A value that fills the column gets a
-// space in front, so that it never runs into the value before it and the
-// line can still be read back as a field book.
-std::string Column(const std::string& value) {
-  std::string text = RString(value, kColumn);
-  if (text.empty() || text.front() != ' ') text.insert(0, 1, ' ');
-  return text;
-}
 
 }  // namespace
 
@@ -56,7 +49,8 @@ void incocphu(RunState& st) {
       return;
     }
     out.Line(Trim(peg[0]) + " " + st.TenDiem.str() + RString(reading, kColumn) +
-             Column(Trim(peg[3])) + Column(Trim(peg[4])) + " " + Trim(peg[5]) + " " + Trim(peg[6]));
+             NumberColumn(peg[3], kColumn) + NumberColumn(peg[4], kColumn) + " " + Trim(peg[5]) +
+             " " + Trim(peg[6]));
   }
 }
 

@@ -7,7 +7,7 @@
 namespace kavu {
 namespace {
 
-std::string PrismText(double ccg) { return RString(Mask(ccg, "####.000"), 10); }
+std::string PrismText(double ccg) { return Mask(ccg, "####.000"); }
 
 }  // namespace
 
@@ -28,8 +28,9 @@ void GhiMangSoLieuToaDo(RunState& st) {
   st.MangSoLieuToaDo.resize(st.MangSoLieuASC.size());
   std::string line;
   if (st.stp >= 5 && st.stp <= 7 && (st.stp == 5 || DescriptiveWords(st))) {
-    line = LString(Trim(st.TenDiem.str()), 5) + RString(st.StX.str(), 12) +
-           RString(st.StY.str(), 12) + RString(st.StZ.str(), 12) + PrismText(st.ccg);
+    line = LString(Trim(st.TenDiem.str()), 5) + NumberColumn(st.StX.str(), 12) +
+           NumberColumn(st.StY.str(), 12) + NumberColumn(st.StZ.str(), 12) +
+           NumberColumn(PrismText(st.ccg), 10);
     if (st.stp >= 6) line += " " + st.Field(5);
     if (st.stp == 7) line += " " + st.Field(6);
   }
@@ -46,8 +47,8 @@ void GhiMangSoLieuVaoSoDo(RunState& st) {
       if (st.stp == 7) note += " " + st.Field(6);
     }
   }
-  st.MangSoLieuSoDo.push_back(
-      {st.TenDiem.str(), st.StGoc, st.StS.str(), GocSt1(st.GocD), PrismText(st.ccg), note});
+  st.MangSoLieuSoDo.push_back({st.TenDiem.str(), st.StGoc, st.StS.str(), GocSt1(st.GocD),
+                               RString(PrismText(st.ccg), 10), note});
 }
 
 }  // namespace kavu

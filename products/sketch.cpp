@@ -40,7 +40,7 @@ std::string T(std::string_view utf8) { return Utf8ToTcvn3(utf8); }
 // of six characters or more pushes the rest of its row to the right.
 std::string DetailRow(const SketchRow& row) {
   return "|" + LString(Trim(row[0]), 5) + " |" + RString(Trim(row[2]), 9) + " |  " + row[1] +
-         "  |  " + FixedWidth(row[3], 11) + "| " + FixedWidth(row[4], 10) + "  | " +
+         "  |  " + NumberWidth(row[3], 11) + "| " + NumberWidth(row[4], 10) + "  | " +
          FixedWidth(row[5], 12) + " |";
 }
 
@@ -48,7 +48,7 @@ std::string DetailRow(const SketchRow& row) {
 // may hold the distance to a check record's point by the time the station
 // ends; the closing row is the orientation's.
 std::string OrientationDistance(const RunState& st) {
-  return FixedWidth(RString(Mask(st.cdhdau, "####.000"), 8), 8);
+  return NumberWidth(RString(Mask(st.cdhdau, "####.000"), 8), 8);
 }
 
 }  // namespace
@@ -72,13 +72,13 @@ void insodo(RunState& st) {
            FixedWidth(nhap[3], 20));
   out.Line(T(kSurveyor) + FixedWidth(nhap[4], 17) + T(kRecorder) + FixedWidth(nhap[5], 18) +
            T(kDate) + FixedWidth(nhap[6], 10));
-  out.Line(T(kStationCoordinates) + FixedWidth(st.StXTram, 11) +
-           "    Y= " + FixedWidth(st.StYTram, 10) + "    Z= " + FixedWidth(st.StZTram, 10));
-  out.Line(T(kOrientation1) + st.TenDinhHuong.str() + " X= " + FixedWidth(st.StXDinhHuong, 11) +
-           "    Y= " + FixedWidth(st.StYDinhHuong, 10) +
-           "    Z= " + FixedWidth(st.StZDinhHuong, 10));
-  out.Line(T(kOrientation2) + st.TenDinhHuong2.str() + " X= " + FixedWidth(st.StXDinhHuong2, 11) +
-           "    Y= " + FixedWidth(st.StYDinhHuong2, 10));
+  out.Line(T(kStationCoordinates) + NumberWidth(st.StXTram, 11) +
+           "    Y= " + NumberWidth(st.StYTram, 10) + "    Z= " + NumberWidth(st.StZTram, 10));
+  out.Line(T(kOrientation1) + st.TenDinhHuong.str() + " X= " + NumberWidth(st.StXDinhHuong, 11) +
+           "    Y= " + NumberWidth(st.StYDinhHuong, 10) +
+           "    Z= " + NumberWidth(st.StZDinhHuong, 10));
+  out.Line(T(kOrientation2) + st.TenDinhHuong2.str() + " X= " + NumberWidth(st.StXDinhHuong2, 11) +
+           "    Y= " + NumberWidth(st.StYDinhHuong2, 10));
   out.Line(std::string(kFormWidth, '='));
   out.Line(T(kColumnHeads1));
   out.Line(T(kColumnHeads2));

@@ -62,8 +62,14 @@ TEST(Mask, HalvesAwayFromZeroAndOptionalDigits) {
   EXPECT_EQ(Mask(0.0005, "####0.000"), "0.001");
   EXPECT_EQ(Mask(-12.3456, "#######.000"), "-12.346");
   EXPECT_EQ(Mask(123456789, "####.000"), "123456789.000");
-  EXPECT_EQ(Mask(std::numeric_limits<double>::quiet_NaN(), "##0"), "0");
-  EXPECT_EQ(Mask(std::numeric_limits<double>::infinity(), "####.000"), ".000");
+  // Beyond 2^53 the value's own decimal expansion, never a cut or wrapped
+  // integer; no number at all reads back as none.
+  EXPECT_EQ(Mask(1e20, "#######.000"), "100000000000000000000.000");
+  EXPECT_EQ(Mask(-9007199254740993.0, "##0"), "-9007199254740992");
+  EXPECT_EQ(Mask(0x1p70, "0.00"), "1180591620717411303424.00");
+  EXPECT_EQ(Mask(1.5e17, "####.0#"), "150000000000000000.0");
+  EXPECT_EQ(Mask(std::numeric_limits<double>::quiet_NaN(), "##0"), "***");
+  EXPECT_EQ(Mask(-std::numeric_limits<double>::infinity(), "####.000"), "********");
 }
 
 TEST(NumberText, FifteenDigitsAndNoLeadingZero) {

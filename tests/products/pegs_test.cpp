@@ -13,8 +13,8 @@ using testing::Expected;
 using testing::FileBytes;
 using testing::FreshFolder;
 
-// Control points: a name, X and Y longer than their columns (cut to 12, 11
-// and 10), a TCVN3 name, an empty and a negative height.
+// Control points: a name, X and Y longer than their columns (the name cut to
+// 12, the numbers kept whole), a TCVN3 name, an empty and a negative height.
 const std::vector<KnownPoint> kControl = {
     {"P1", "2345678.123", "567890.456", "12.5"},
     {"ABCDEFGHIJKLMN", "12345678.1234", "1234567.1234", ""},

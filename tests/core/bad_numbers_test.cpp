@@ -1,0 +1,212 @@
+// Records whose numbers cannot give a true point: each is reported when it is
+// read, counted, and kept out of every product; numbers are written whole.
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "core/lines.h"
+#include "core/run.h"
+#include "core/text.h"
+#include "support.h"
+
+namespace kavu {
+namespace {
+
+namespace fs = std::filesystem;
+using testing::FileBytes;
+using testing::FreshFolder;
+using testing::RecordingHost;
+using testing::WriteBytes;
+
+// Station KC1 oriented on KC2, 100 m due south of it.
+const std::string kControl = "TR KC1 1000 1000 10\r\nTR KC2 900 1000 12\r\n";
+const std::string kHead = kControl + "TR KC1 1.5\r\nDKD KC2\r\n";
+const std::string kGood = "OK1 900000 10 900000 1.5\r\n";
+
+struct Case {
+  const char* what;
+  std::string book;
+  std::vector<std::string> lines;    // message lines of the error report, in order
+  std::vector<std::string> present;  // texts some product holds
+  std::vector<std::string> absent;   // texts no product holds
+  int fdc = 1;
+  std::string common;  // the common control file, when one is used
+
+  Case(const char* w, std::string b, std::vector<std::string> l, std::vector<std::string> p,
+       std::vector<std::string> a, int heights = 1, std::string commonFile = "")
+      : what(w),
+        book(std::move(b)),
+        lines(std::move(l)),
+        present(std::move(p)),
+        absent(std::move(a)),
+        fdc(heights),
+        common(std::move(commonFile)) {}
+};
+
+const std::string kNul(1, '\0');
+
+std::string Name(const char* name) { return FixedWidth(name, 12); }
+
+const Case kCases[] = {
+    {"distance nan",
+     kHead + "BADPT 900000 nan 900000 1.5\r\n" + kGood,
+     {"Diem BADPT        so lieu khong phai so"},
+     {"OK1"},
+     {"BADPT"}},
+    {"distance NUL",
+     kHead + "BADPT 900000 " + kNul + " 900000 1.5\r\n" + kGood,
+     {"Diem BADPT        so lieu khong phai so"},
+     {"OK1"},
+     {"BADPT"}},
+    {"check distance not a number",
+     kHead + "K1 0 nan 900000 1.5 KC2 KT\r\n" + kGood,
+     {"Diem K1           so lieu khong phai so"},
+     {"OK1"},
+     {}},
+    {"angle-only detail",
+     kHead + "BADPT 900000 0 900000 1.5\r\n" + kGood,
+     {"Diem BADPT        khong co khoang cach"},
+     {"OK1"},
+     {"BADPT"}},
+    {"angle-only peg",
+     kHead + "BADPT 900000 -0.000 900000 1.5 PEGX\r\n" + kGood,
+     {"Diem BADPT        khong co khoang cach"},
+     {"OK1"},
+     {"BADPT", "PEGX"}},
+    {"backsight without distance",
+     kHead + "X1 0 0 900000 1.5 KC2\r\nX2 0 - 900000 1.5 KC2\r\n" + kGood,
+     {},
+     {"OK1"},
+     {}},
+    {"zenith 0",
+     kHead + "BADPT 900000 10 0 1.5\r\n" + kGood,
+     {"Diem BADPT        nhap sai goc dung"},
+     {"OK1"},
+     {"BADPT"}},
+    {"zenith 360 decodes to 0",
+     kHead + "BADPT 900000 10 3600000 1.5\r\n" + kGood,
+     {"Diem BADPT        nhap sai goc dung"},
+     {"OK1"},
+     {"BADPT"}},
+    {"peg zenith 0",
+     kHead + "BADPT 900000 10 0 1.5 PEGX\r\n" + kGood,
+     {"Diem BADPT        nhap sai goc dung"},
+     {"OK1"},
+     {"BADPT", "PEGX"}},
+    {"zenith 0 with heights off", kHead + "ZEN 900000 10 0 1.5\r\n", {}, {"ZEN"}, {}, 0},
+    {"instrument height not a number",
+     kControl + "TR KC1 abc\r\nDKD KC2\r\n" + kGood,
+     {"Diem KC1          thieu chieu cao may"},
+     {"TR " + Name("KC1") + " abc", "OK1"},
+     {}},
+    {"long names of control, station and orientation records",
+     "TR CONTROLPOINT1 1000 1000 10\r\n" + kControl +
+         "TR STATIONPOINT1 1.5\r\nDKD ORIENTPOINT12\r\n" + kGood,
+     {"Diem CONTROLPOINT1 ten dai qua 12 ky tu", "Diem STATIONPOINT1 ten dai qua 12 ky tu",
+      "Diem: STATIONPOINT khong co toa do", "Diem ORIENTPOINT12 ten dai qua 12 ky tu",
+      "Diem: ORIENTPOINT1 khong co toa do", "Cac diem mia OK1   - OK1   khong duoc tinh"},
+     {},
+     {"OK1"}},
+    {"long names of detail and peg",
+     kHead + "DETAILNAME123 900000 10 900000 1.5\r\nP1 900000 20 900000 1.5 PEGNAME123456\r\n",
+     {"Diem DETAILNAME123 ten dai qua 12 ky tu", "Diem PEGNAME123456 ten dai qua 12 ky tu"},
+     {"DETAILNAME123", "TR PEGNAME12345"},
+     {}},
+    {"long name first, then the one number line",
+     kHead + "DETAILNAME123 900000 nan 900000 1.5\r\nDETAILNAME456 900000 0 0 1.5\r\n" + kGood,
+     {"Diem DETAILNAME123 ten dai qua 12 ky tu", "Diem DETAILNAME12 so lieu khong phai so",
+      "Diem DETAILNAME456 ten dai qua 12 ky tu", "Diem DETAILNAME45 khong co khoang cach"},
+     {"OK1"},
+     {"DETAILNAME"}},
+    {"no long-name line for check, backsight and skipped records",
+     kControl + "TR ORIENTPOINT1 900 1000 12\r\nTR KC1 1.5\r\nDKD ORIENTPOINT1\r\n" +
+         "K1 0 10 900000 1.5 CHECKNAME1234 KT\r\nX1 0 100 900000 1.5 ORIENTPOINT1X\r\n" + kGood +
+         "TR NOPE 1.5\r\nDKD KC2\r\nDETAILNAME123 900000 10 900000 1.5\r\n",
+     {"Diem: CHECKNAME123 khong co toa do", "Diem: NOPE         khong co toa do",
+      "Cac diem mia DETAI - DETAI khong duoc tinh"},
+     {"OK1"},
+     {"DETAILNAME"}},
+    {"long name in the common control file only",
+     "TR FIELDBOOKPT12 1 1 1\r\n" + kHead + kGood,
+     {"Diem COMMONPOINT12 ten dai qua 12 ky tu"},
+     {"OK1"},
+     {"FIELDBOOK"},
+     1,
+     "TR COMMONPOINT12 5 5 5\r\n" + kControl},
+    // The padded name "3" once matched inside the Y field of 1003's line.
+    {"a name inside another's line is not taken for it",
+     "TR 1003 1000 3\r\nTR 3 900 3\r\nTR 1003 1.5\r\nDKD 3\r\n" + kGood,
+     {},
+     {"TR " + Name("1003") + "1000", "TR " + Name("3") + "900"},
+     {}},
+    {"coordinates wider than their columns",
+     "TR W1 12345678901.500 1000 12345678.5\r\nTR W2 12345678801.500 1000 12\r\n"
+     "TR W1 1.5\r\nDKD W2\r\nOK1 1800000 10 900000 1.5\r\n",
+     {},
+     {"TR " + Name("W1") + "12345678901.500 1000       12345678.5",  // .kc, TRIDO
+      "OK1   12345678911.500 1000.000  ",                            // .txt
+      "OK1   12345678911.500    1000.000 12345678.500     1.500"},   // .td1
+     {}},
+    {"a distance of 1e20",
+     kHead + "FAR 1800000 1e20 900000 1.5\r\n",
+     {"Diem FAR          co the nhap sai canh", "Diem FAR          co the nhap sai canh"},
+     {"FAR   100000000000000000000.000 1000.000  "},
+     {}},
+};
+
+// The message lines of the error report, without its head and empty lines.
+std::vector<std::string> ReportLines(const fs::path& path) {
+  std::vector<std::string> lines;
+  const auto all = ReadLines(path);
+  if (!all) return lines;
+  for (std::size_t i = 2; i < all->size(); ++i) {
+    if (!(*all)[i].empty()) lines.push_back((*all)[i]);
+  }
+  return lines;
+}
+
+TEST(BadNumbers, AreReportedOnceAndKeptOutOfEveryProduct) {
+  for (const Case& c : kCases) {
+    SCOPED_TRACE(c.what);
+    const fs::path folder = FreshFolder();
+    fs::create_directories(folder / "data");
+    WriteBytes(folder / "data" / "job.asc", c.book);
+    RunState st;
+    st.txtfile = (folder / "data" / "job.asc").string();
+    st.seed = 7;
+    st.fasc = st.ftd = st.fkc = st.fcp = st.fsdo = 1;
+    st.fdc = c.fdc;
+    if (!c.common.empty()) {
+      WriteBytes(folder / "common.kc", c.common);
+      st.ckKC = 1;
+      st.txtFKC = (folder / "common.kc").string();
+    }
+    RecordingHost host;
+    const RunResult result = tinh_Click(st, host);
+    ASSERT_EQ(result.outcome, RunOutcome::Completed);
+
+    const std::vector<std::string> lines = ReportLines(folder / "data" / "job.err");
+    EXPECT_EQ(lines, c.lines);
+    long long skipped = 0;
+    for (const std::string& line : lines) skipped += line.starts_with("Cac diem mia ") ? 1 : 0;
+    EXPECT_EQ(result.err, static_cast<long long>(lines.size()) - skipped);
+
+    std::string products;
+    for (const char* name : {"job.txt", "job.kc", "job.td1", "job.cp", "job.sdo"}) {
+      products += FileBytes(folder / "data" / name);
+    }
+    products += FileBytes(folder / "TRIDO" / "job.asc");
+    for (const std::string& text : c.present) {
+      EXPECT_NE(products.find(text), std::string::npos) << "missing: " << text;
+    }
+    for (const std::string& text : c.absent) {
+      EXPECT_EQ(products.find(text), std::string::npos) << "present: " << text;
+    }
+  }
+}
+
+}  // namespace
+}  // namespace kavu

@@ -1,0 +1,77 @@
+#!/usr/bin/env bash
+# Differential check: the batch command of an earlier revision and of the
+# working tree compute the same inputs; every product, the standard output
+# (times left out) and the exit status must be the same.
+#
+#   tools/differential.sh REV [COUNT]
+#
+# Inputs: COUNT seeded generated field books (default 2000), every field book
+# and instrument file under tests/ and examples/, and the real recordings in
+# ../shared/realdata when they are there. Differences are listed, with the
+# first differing lines, and the script exits 1.
+set -euo pipefail
+cd "$(dirname "$0")/.."
+rev="${1:?usage: $0 REV [COUNT]}"
+count="${2:-2000}"
+top=$PWD
+work=$top/build/differential
+base_src=$work/base-src
+
+. tools/ensure-packages.sh
+ensure_packages cmake ninja-build g++ libcli11-dev python3
+
+build_cli() {  # source folder, build folder
+  cmake -S "$1" -B "$2" -G Ninja -DCMAKE_BUILD_TYPE=Release -DKAVU_BUILD_TESTS=OFF \
+    -DKAVU_BUILD_BENCH=OFF -DKAVU_BUILD_UI=OFF >/dev/null
+  cmake --build "$2" --target kavu-cli >/dev/null
+}
+
+rm -rf "$work"
+mkdir -p "$work/inputs"
+git worktree add --detach -f "$base_src" "$rev" >/dev/null 2>&1
+trap 'git worktree remove --force "$base_src" >/dev/null 2>&1 || true' EXIT
+build_cli "$base_src" "$work/base-build"
+build_cli "$top" "$work/new-build"
+
+for ((i = 1; i <= count; i++)); do
+  python3 tools/gen_fieldbook.py "$i" "$work/inputs/gen$i.asc"
+done
+while IFS= read -r -d '' f; do
+  cp "$f" "$work/inputs/$(echo "${f#./}" | tr / _)"
+done < <(find ./tests/data ./examples -type f \
+  \( -iname '*.asc' -o -iname '*.sdr' -o -iname '*.gre' -o -iname '*.obs' -o -iname '*.set' \
+     -o -iname '*.idx' -o -iname '*.tcm' \) -print0)
+if [ -d ../shared/realdata ]; then
+  for f in ../shared/realdata/*.*; do
+    case "$f" in *.md) continue ;; esac
+    cp "$f" "$work/inputs/real_$(basename "$f")"
+  done
+fi
+
+# Each input is computed alone in a folder of its own, with every product.
+run_one() {  # build, input, folder
+  mkdir -p "$3/job"
+  cp "$2" "$3/job/"
+  local status=0
+  "$1/cli/kavu-cli" --all --seed 7 "$3/job/$(basename "$2")" >"$3/stdout" 2>"$3/stderr" ||
+    status=$?
+  echo "$status" >"$3/status"
+  # The start and end times are the only texts that depend on the clock.
+  sed -i -E 's/[0-9]{2}:[0-9]{2}:[0-9]{2}/HH:MM:SS/' "$3/stdout"
+}
+
+differ=0
+checked=0
+for f in "$work/inputs"/*; do
+  name=$(basename "$f")
+  run_one "$work/base-build" "$f" "$work/base/$name"
+  run_one "$work/new-build" "$f" "$work/new/$name"
+  checked=$((checked + 1))
+  if ! diff -r -q "$work/base/$name" "$work/new/$name" >/dev/null; then
+    differ=$((differ + 1))
+    echo "== $name"
+    diff -r "$work/base/$name" "$work/new/$name" | head -n 8 || true
+  fi
+done
+echo "$checked inputs, $differ differ (base $rev)"
+[ "$differ" -eq 0 ]
