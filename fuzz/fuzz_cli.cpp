@@ -3,8 +3,6 @@
 // options, one a line (only lines that begin with "-" are passed, so that the
 // products stay in the fuzzer's folder), and the rest is the chosen file,
 // named with the kind's extension.
-#include <unistd.h>
-
 #include <array>
 #include <cstddef>
 #include <cstdint>
@@ -16,27 +14,22 @@
 
 #include "cli/cli.h"
 #include "core/lines.h"
+#include "fuzz/run_every_product.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  namespace fs = std::filesystem;
-  static const fs::path folder =
-      fs::temp_directory_path() / ("kavu_fuzz_cli_" + std::to_string(getpid())) / "data";
+  static const std::filesystem::path folder = kavu::fuzzing::Folder("kavu_fuzz_cli");
   static constexpr std::array<const char*, 10> kExtensions{".asc", ".sdr", ".obs", ".set", ".raw",
                                                            ".idx", ".tcm", ".gre", ".dn7", ".dat"};
   if (size == 0) return 0;
-  fs::create_directories(folder);
   const int kind = data[0] % 10;
   const std::string_view rest(reinterpret_cast<const char*>(data) + 1, size - 1);
   const std::size_t nul = rest.find('\0');
   const std::string_view options = rest.substr(0, nul);
   const std::string_view content = nul == std::string_view::npos ? "" : rest.substr(nul + 1);
 
-  const fs::path file = folder / (std::string("job") + kExtensions[static_cast<std::size_t>(kind)]);
-  {
-    kavu::TextOut out(file);
-    out.Write(content);
-    out.commit();
-  }
+  const std::filesystem::path file =
+      folder / (std::string("job") + kExtensions[static_cast<std::size_t>(kind)]);
+  kavu::fuzzing::WriteFile(file, content);
   std::vector<std::string> args{"--kind", std::to_string(kind), "--seed", "1"};
   for (const std::string& line : kavu::SplitLines(options)) {
     if (line.starts_with("-")) args.push_back(line);
