@@ -52,7 +52,7 @@ TEST_F(TopcomRun, Topcom226ExampleComputes) {
 TEST_F(TopcomRun, RealKeywordFileRunsToTheEnd) {
   EXPECT_EQ(Run({std::filesystem::path(KAVU_REALDATA) / "geoeasy-test.idx"}, {"--txt"}),
             kExitDataErrors);
-  EXPECT_EQ(FileBytes(dir_ / "geoeasy-test.asc"), ConvertIdx(RealData("geoeasy-test.idx")));
+  EXPECT_EQ(FileBytes(dir_ / "geoeasy-test.asc"), ConvertIdx(RealData("geoeasy-test.idx")).book);
 }
 
 }  // namespace

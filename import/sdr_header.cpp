@@ -1,0 +1,117 @@
+#include "import/sdr_header.h"
+
+#include <cmath>
+
+#include "core/messages.h"
+#include "core/numbers.h"
+#include "core/text.h"
+#include "import/instrument_common.h"
+
+namespace kavu {
+
+std::string UnreadableDeclaration(std::string_view record) {
+  return std::string(msg::kUnreadableDeclaration) + Trim(record);
+}
+
+double Units::Reading(double value) const {
+  const double degrees = Angle(value);
+  if (!counter_clockwise) return degrees;
+  const double clockwise = std::fmod(360 - degrees, 360.0);
+  return clockwise < 0 ? clockwise + 360 : clockwise;
+}
+
+std::string Units::LengthText(std::string_view text) const {
+  if (metres_per_unit == 1 || TrimView(text).empty()) return std::string(text);
+  return Mask(Length(Val(text)), "0.000");
+}
+
+namespace {
+
+// The unit digits close the "00NM" record: angle, distance, pressure,
+// temperature, coordinate order, direction. False when a digit that matters
+// is not one the program knows.
+bool ReadUnitDigits(std::string_view digits, SdrHeader& header) {
+  bool known = true;
+  switch (digits[0]) {
+    case '1':
+      break;
+    case '2':
+      header.units.degrees_per_unit = 0.9;
+      break;
+    case '3':
+      header.units.degrees_per_unit = 360.0 / 6400;
+      break;
+    default:
+      known = false;
+  }
+  switch (digits[1]) {
+    case '1':
+      break;
+    case '2':
+      header.units.metres_per_unit = 0.3048;
+      break;
+    default:
+      known = false;
+  }
+  switch (digits[4]) {
+    case '1':
+      break;
+    case '2':
+      header.east_north = true;
+      break;
+    default:
+      known = false;
+  }
+  switch (digits[5]) {
+    case '1':
+      break;
+    case '2':
+      header.units.counter_clockwise = true;
+      break;
+    default:
+      known = false;
+  }
+  return known;
+}
+
+}  // namespace
+
+SdrHeader ReadSdrHeader(const std::vector<std::string>& lines, int width_default) {
+  SdrHeader header;
+  header.width = width_default;
+  const std::string* instrument = nullptr;
+  const std::string* job = nullptr;
+  for (const std::string& line : lines) {
+    const std::string_view code = RecordCode(line);
+    if (code == "00NM" && instrument == nullptr) instrument = &line;
+    if (code == "10NM" && job == nullptr) job = &line;
+  }
+  if (job != nullptr) {
+    header.width = Columns(*job, 21, 21) == "1" ? 16 : 4;
+  } else if (instrument != nullptr && instrument->find("SDR33") != std::string::npos) {
+    header.width = 16;
+  }
+  if (instrument != nullptr) {
+    std::string_view text = *instrument;
+    while (!text.empty() && text.back() == ' ') text.remove_suffix(1);
+    if (text.size() >= 10) {
+      const std::string_view digits = text.substr(text.size() - 6);
+      bool all_digits = true;
+      for (const char c : digits) all_digits = all_digits && c >= '0' && c <= '9';
+      if (all_digits && !ReadUnitDigits(digits, header)) {
+        header.report.push_back(UnreadableDeclaration(*instrument));
+      }
+    }
+  }
+  return header;
+}
+
+std::string BlankFreeName(std::string_view name) {
+  std::string out(name);
+  for (char& c : out) {
+    if (c == ' ') c = '_';
+  }
+  return out;
+}
+
+}  // namespace kavu
