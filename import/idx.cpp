@@ -18,7 +18,7 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
-#include "import/sdr_header.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
@@ -90,7 +90,7 @@ double DmsDegrees(std::string_view text) {
 }
 
 // An observation as read, and reduced to face 1.
-struct Shot {
+struct Pointing {
   std::string name;
   double reading = 0, zenith = 0, slope = 0, prism = 0;
   bool face2 = false;
@@ -101,7 +101,7 @@ struct Declarations {
   Units units;
 };
 
-Shot ReadShot(const CommaLine& obs, const Declarations& declared) {
+Pointing ReadPointing(const CommaLine& obs, const Declarations& declared) {
   auto angle = [&declared](std::string_view text) {
     switch (declared.angle) {
       case AngleUnit::kDms:
@@ -112,7 +112,7 @@ Shot ReadShot(const CommaLine& obs, const Declarations& declared) {
         return Val(text);
     }
   };
-  Shot shot;
+  Pointing shot;
   shot.name = BlankFreeName(Unquote(obs.field[1]));
   shot.reading = angle(obs.field[3]);
   shot.zenith = angle(obs.field[4]);
@@ -128,8 +128,8 @@ Shot ReadShot(const CommaLine& obs, const Declarations& declared) {
 }
 
 // The mean of the two faces of one pointing.
-Shot MeanOfFaces(const Shot& a, const Shot& b) {
-  Shot mean = a;
+Pointing MeanOfFaces(const Pointing& a, const Pointing& b) {
+  Pointing mean = a;
   double gap = b.reading - a.reading;
   if (gap > 180) gap -= 360;
   if (gap < -180) gap += 360;
@@ -140,7 +140,7 @@ Shot MeanOfFaces(const Shot& a, const Shot& b) {
   return mean;
 }
 
-std::string DetailRecord(const Shot& shot, double reference) {
+std::string DetailRecord(const Pointing& shot, double reference) {
   const double horizontal = std::fabs(HorizontalDistance(shot.slope, shot.zenith));
   // The name is padded to 5 columns but never cut: 8-digit point numbers are
   // common and cutting them would merge different points.
@@ -225,7 +225,7 @@ Conversion ConvertIdx(std::string_view content) {
 
     // The set-up's observations, each reduced to face 1; the two faces of
     // one pointing, shot one after the other, become their mean.
-    std::vector<Shot> shots;
+    std::vector<Pointing> shots;
     bool paired = false;
     for (; i < n; ++i) {
       // A STN_ID line starts the next set-up even when END SLOPE is missing.
@@ -236,7 +236,7 @@ Conversion ConvertIdx(std::string_view content) {
         break;
       }
       if (obs.count < 7) continue;  // not an observation: skipped
-      Shot shot = ReadShot(obs, declared);
+      Pointing shot = ReadPointing(obs, declared);
       if (!shots.empty() && !paired && shots.back().name == shot.name &&
           shots.back().face2 != shot.face2) {
         shots.back() = MeanOfFaces(shots.back(), shot);
@@ -250,7 +250,7 @@ Conversion ConvertIdx(std::string_view content) {
     // reads 0.
     put("DKD " + (shots.empty() ? std::string() : shots.front().name));
     const double reference = shots.empty() ? 0 : shots.front().reading;
-    for (const Shot& shot : shots) put(DetailRecord(shot, reference));
+    for (const Pointing& shot : shots) put(DetailRecord(shot, reference));
   }
   return result;
 }

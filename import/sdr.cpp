@@ -16,37 +16,10 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
-#include "import/sdr_header.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
-
-struct Span {
-  std::size_t from, to;
-  std::string_view Of(std::string_view line) const { return Columns(line, from, to); }
-};
-
-// Where the fields stand in the two layouts.
-struct Layout {
-  Span id;                            // point of an "08" record, station of a set-up
-  Span x, y, h;                       // coordinates of "08" and set-up records
-  Span height;                        // instrument height of a set-up
-  Span description;                   // of a set-up (4-character layout)
-  Span target;                        // backsight of "07", target of "09F1"
-  Span azimuth;                       // recorded backsight bearing of "07"
-  Span circle;                        // circle reading on the backsight of "07"
-  Span prism;                         // "03NM"
-  Span slope, zenith, reading, note;  // "09F1"
-};
-
-constexpr Layout kNarrow{{5, 8},   {9, 18},  {19, 28}, {29, 38}, {39, 48}, {49, 65}, {9, 12},
-                         {13, 22}, {23, 32}, {5, 14},  {13, 22}, {23, 32}, {33, 42}, {43, 59}};
-constexpr Layout kWide{{5, 20},  {21, 36}, {37, 52}, {53, 68}, {69, 84}, {85, 100}, {21, 36},
-                       {37, 52}, {53, 68}, {5, 20},  {37, 52}, {53, 68}, {69, 84},  {85, 100}};
-
-bool IsCoordinateCode(std::string_view code) {
-  return code == "08KI" || code == "08CO" || code == "08TP";
-}
 
 // The names of the points: one per identifier through the whole recording.
 // In the wide layout a point is named by its identifier. In the narrow one a
@@ -54,20 +27,14 @@ bool IsCoordinateCode(std::string_view code) {
 // or more that its coordinate records give it, else "DKC" + its identifier.
 class Names {
  public:
-  Names(const std::vector<std::string>& lines, const Layout& layout, bool wide,
-        bool (*is_station)(std::string_view))
-      : wide_(wide) {
-    if (wide) return;
+  Names(const std::vector<std::string>& lines, const SdrLayout& layout)
+      : wide_(layout.width == 16) {
+    if (wide_) return;
     for (const std::string& line : lines) {
       const std::string_view code = RecordCode(line);
-      std::string_view description;
-      if (IsCoordinateCode(code)) {
-        description = ColumnsFrom(line, 49);
-      } else if (is_station(code)) {
-        description = layout.description.Of(line);
-      } else {
-        continue;
-      }
+      if (!IsCoordinateCode(code)) continue;
+      const std::string_view description =
+          IsSetUpCode(code) ? layout.description.Of(line) : ColumnsFrom(line, 49);
       if (TrimView(layout.x.Of(line)).empty() || TrimView(layout.y.Of(line)).empty()) continue;
       const std::string id = Identifier(line, layout.id);
       auto [it, fresh] = labels_.try_emplace(id);
@@ -103,22 +70,20 @@ class Names {
 
 struct Observation {
   std::string name;
-  double reading = 0;  // clockwise, decimal degrees
-  double distance = 0;
-  double zenith = 0;
+  Shot shot;
   std::string prism_height;
   std::string description;
 };
 
 class SdrWriter {
  public:
-  SdrWriter(std::string& out, const Names& names, const SdrHeader& header, const Layout& layout,
+  SdrWriter(std::string& out, const Names& names, const SdrHeader& header, const SdrLayout& layout,
             int kind)
       : out_(out),
         names_(names),
         header_(header),
         layout_(layout),
-        wide_(header.width == 16),
+        wide_(layout.width == 16),
         setups_(kind == 1 || kind == 2 || kind == 7 || kind == 8),
         keyed_only_(kind == 8) {}
 
@@ -158,11 +123,13 @@ class SdrWriter {
     } else {
       station_name_ = names_.Of(id);
     }
+    station_open_ = true;
   }
 
   void Backsight(std::string_view line) {
     CloseSetUp();
     AppendLine(out_, "TR " + station_name_ + " " + instrument_height_);
+    station_open_ = false;
     backsight_id_ = names_.Identifier(line, layout_.target);
     backsight_name_ = names_.Of(backsight_id_);
     backsight_found_ = wide_ || names_.Known(backsight_id_) != nullptr;
@@ -176,12 +143,17 @@ class SdrWriter {
   }
 
   void Observe(std::string_view line) {
-    const Units& units = header_.units;
+    // A set-up without backsight record: its points follow its station
+    // record with no orientation, so the run reports them instead of
+    // computing them from the set-up before.
+    if (station_open_) {
+      AppendLine(out_, "TR " + station_name_ + " " + instrument_height_);
+      station_open_ = false;
+      have_backsight_ = false;
+    }
     Observation obs;
     const std::string id = names_.Identifier(line, layout_.target);
-    obs.zenith = units.Angle(Val(layout_.zenith.Of(line)));
-    obs.reading = units.Reading(Val(layout_.reading.Of(line)));
-    obs.distance = HorizontalDistance(units.Length(Val(layout_.slope.Of(line))), obs.zenith);
+    obs.shot = ReadShot(line, layout_, header_.units);
     obs.prism_height = prism_height_;
     const std::string* known = names_.Known(id);
     if (wide_) {
@@ -192,7 +164,7 @@ class SdrWriter {
     }
 
     if (have_backsight_ && id == backsight_id_) {
-      reference_ = obs.reading;
+      reference_ = obs.shot.reading;
       if (!oriented_) {
         const std::string note = Trim(layout_.note.Of(line));
         if (!backsight_found_ && note.size() > 2) {
@@ -228,21 +200,19 @@ class SdrWriter {
   }
 
   void Write(const Observation& obs) {
-    const double reading = TurnReading(obs.reading, reference_);
-    if (wide_) {
-      AppendLine(out_, LString(obs.name, 10) + GocSt(reading) + DistanceText(obs.distance) +
-                           GocSt(obs.zenith) + PrismHeightText(obs.prism_height));
-    } else {
-      AppendLine(out_, LString(obs.name, 4) + GocSt(reading) + DistanceText(obs.distance) +
-                           GocSt(obs.zenith) + PrismHeightText(obs.prism_height) + " " +
-                           obs.description);
-    }
+    const Shot& shot = obs.shot;
+    std::string record =
+        LString(obs.name, wide_ ? 10 : 4) + GocSt(TurnReading(shot.reading, reference_)) +
+        DistanceText(shot.distance) + GocSt(shot.zenith) + PrismHeightText(obs.prism_height);
+    // The 4-column book carries a description; the 16-column one none.
+    if (!wide_) record += " " + obs.description;
+    AppendLine(out_, record);
   }
 
   std::string& out_;
   const Names& names_;
   const SdrHeader& header_;
-  const Layout& layout_;
+  const SdrLayout& layout_;
   bool wide_;
   bool setups_;      // kinds whose set-up records are read
   bool keyed_only_;  // only the keyed-in set-up codes
@@ -252,6 +222,7 @@ class SdrWriter {
   std::string backsight_id_;
   std::string backsight_name_;
   bool backsight_found_ = false;
+  bool station_open_ = false;    // a set-up record waits for its backsight record
   bool have_backsight_ = false;  // no observation is the backsight before one is named
   bool oriented_ = false;
   std::optional<double> circle_;  // circle reading on the backsight, as recorded
@@ -265,28 +236,15 @@ Conversion ConvertSdrFamily(std::string_view content, int kind, int width_defaul
   Conversion result;
   const SdrHeader header = ReadSdrHeader(lines, width_default);
   result.report = header.report;
-  const bool wide = header.width == 16;
-  const Layout& layout = wide ? kWide : kNarrow;
-
-  static constexpr auto is_station = [](std::string_view code) {
-    return code == "02TP" || code == "02KI";
-  };
-  const Names names(lines, layout, wide, +is_station);
+  const SdrLayout& layout = header.width == 16 ? kWideLayout : kNarrowLayout;
+  const Names names(lines, layout);
 
   // Pass 1: every coordinate record, set-ups included, in file order.
   for (const std::string& line : lines) {
-    const std::string_view code = RecordCode(line);
-    if (!IsCoordinateCode(code) && !is_station(code)) continue;
-    std::string x = std::string(layout.x.Of(line));
-    std::string y = std::string(layout.y.Of(line));
-    if (header.east_north) std::swap(x, y);
-    const std::string name = names.Of(names.Identifier(line, layout.id));
-    // Without a name or both coordinates the record would read back wrongly.
-    if (name.empty() || TrimView(x).empty() || TrimView(y).empty()) continue;
-    const std::string_view h = layout.h.Of(line);
-    const Units& units = header.units;
-    AppendLine(result.book, ControlPointRecord(name, units.LengthText(x), units.LengthText(y),
-                                               units.LengthText(wide ? TrimView(h) : h)));
+    if (!IsCoordinateCode(RecordCode(line))) continue;
+    const std::string record =
+        KnownPointRecord(names.Of(names.Identifier(line, layout.id)), line, layout, header);
+    if (!record.empty()) AppendLine(result.book, record);
   }
 
   // Pass 2: the set-ups.

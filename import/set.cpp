@@ -15,7 +15,7 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
-#include "import/sdr_header.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
@@ -43,18 +43,6 @@ std::string TargetName(std::string_view observation) {
                                   : id);
 }
 
-struct Shot {
-  double reading, zenith, distance;
-};
-
-Shot ReadShot(std::string_view line, const Units& units) {
-  Shot shot;
-  shot.reading = units.Reading(Val(Columns(line, 69, 84)));
-  shot.zenith = units.Angle(Val(Columns(line, 53, 68)));
-  shot.distance = HorizontalDistance(units.Length(Val(Columns(line, 37, 52))), shot.zenith);
-  return shot;
-}
-
 }  // namespace
 
 Conversion ConvertSet(std::string_view content) {
@@ -71,16 +59,9 @@ Conversion ConvertSet(std::string_view content) {
   for (const std::string& line : lines) {
     const std::string_view code = RecordCode(line);
     const bool setup = code == "02TP";
-    if (setup || code == "08KI" || code == "08CO" || code == "08TP") {
-      std::string_view x = Columns(line, 21, 36);
-      std::string_view y = Columns(line, 37, 52);
-      if (header.east_north) std::swap(x, y);
-      // Without both coordinates the record would read back as a station.
-      if (!TrimView(x).empty() && !TrimView(y).empty()) {
-        put(ControlPointRecord(StationName(line), units.LengthText(TrimView(x)),
-                               units.LengthText(TrimView(y)),
-                               units.LengthText(TrimView(Columns(line, 53, 68)))));
-      }
+    if (setup || (IsCoordinateCode(code) && !IsSetUpCode(code))) {
+      const std::string record = KnownPointRecord(StationName(line), line, kWideLayout, header);
+      if (!record.empty()) put(record);
       if (setup) entries.push_back({line, true, {}});
     } else if (code == "03NM") {
       prism_height = units.LengthText(Trim(Columns(line, 5, 20)));
@@ -102,7 +83,7 @@ Conversion ConvertSet(std::string_view content) {
 
     const Entry& orientation = entries[i];
     const std::string orientation_name = TargetName(orientation.line);
-    const Shot first = ReadShot(orientation.line, units);
+    const Shot first = ReadShot(orientation.line, kWideLayout, units);
     std::string instrument_height = units.LengthText(Trim(Columns(setup, 69, 84)));
     if (instrument_height.empty()) instrument_height = "0.0";
 
@@ -116,7 +97,7 @@ Conversion ConvertSet(std::string_view content) {
 
     for (; i < entries.size() && !entries[i].setup; ++i) {
       const std::string_view line = entries[i].line;
-      const Shot shot = ReadShot(line, units);
+      const Shot shot = ReadShot(line, kWideLayout, units);
       put(LString(TargetName(line), 6) + GocSt(TurnReading(shot.reading, first.reading)) +
           DistanceText(shot.distance) + GocSt(shot.zenith) +
           PrismHeightText(entries[i].prism_height) + " " +

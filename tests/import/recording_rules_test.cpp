@@ -65,6 +65,7 @@ struct Scene {
   bool circle = true;
   bool shoot_backsight = true;
   std::string a = "0001", b = "0002", p = "0003";
+  bool then_setup_on_b_without_backsight = false;  // shooting point 4
 };
 
 std::string Recording(const Dialect& d, const Scene& s) {
@@ -111,6 +112,10 @@ std::string Recording(const Dialect& d, const Scene& s) {
   if (s.shoot_backsight)
     file += shot(s.b, kSlopeToB / std::sin(kZenith * std::acos(-1.0) / 180), kCircleOnB);
   file += shot(s.p, kSlope, kCircleOnB + kTurn);
+  if (s.then_setup_on_b_without_backsight) {
+    file += Record(s.station, {{c[0], id(s.b)}, {c[4], len(1.5)}});
+    file += shot("0004", kSlope, kCircleOnB + kTurn);
+  }
   return file;
 }
 
@@ -168,21 +173,27 @@ TEST_F(RecordingRules, SetUpRules) {
   struct Case {
     const char* what;
     Scene scene;
-    bool computed;  // else reported as not computed
+    bool p_computed;
+    const char* not_computed;  // a point the run reports as not computed
   };
   const Case cases[] = {
-      {"keyed-in set-up codes", {.station = "02KI", .backsight = "07KI"}, true},
-      {"backsight never shot: the recorded circle turns", {.shoot_backsight = false}, true},
-      {"nothing to turn by", {.circle = false, .shoot_backsight = false}, false},
-      {"blanks inside identifiers", {.a = "  12", .b = "B  2"}, true},
+      {"keyed-in set-up codes", {.station = "02KI", .backsight = "07KI"}, true, nullptr},
+      {"backsight never shot: the recorded circle turns",
+       {.shoot_backsight = false},
+       true,
+       nullptr},
+      {"nothing to turn by", {.circle = false, .shoot_backsight = false}, false, "3"},
+      {"blanks inside identifiers", {.a = "  12", .b = "B  2"}, true, nullptr},
+      // Not computed from the set-up before it.
+      {"a set-up without backsight record", {.then_setup_on_b_without_backsight = true}, true, "4"},
   };
   for (const Case& c : cases) {
-    EXPECT_EQ(RunFile(c.what, "r.sdr", Recording({}, c.scene)), c.computed ? kExitOk : 1) << c.what;
+    EXPECT_EQ(RunFile(c.what, "r.sdr", Recording({}, c.scene)), c.not_computed ? 1 : kExitOk)
+        << c.what;
     const auto points = Coordinates(std::string(c.what) + "/r.txt");
-    if (c.computed) {
-      ExpectNear(points, "3", kP);
-    } else {
-      EXPECT_EQ(points.count("3"), 0u) << c.what;
+    if (c.p_computed) ExpectNear(points, "3", kP);
+    if (c.not_computed != nullptr) {
+      EXPECT_EQ(points.count(c.not_computed), 0u) << c.what;
       EXPECT_NE(Report(c.what, "r").find(" khong duoc tinh"), std::string::npos) << c.what;
     }
   }

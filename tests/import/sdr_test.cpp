@@ -14,12 +14,13 @@ using testing::TestData;
 // codes.sdr holds every record code and the quirks: one name (the first
 // description) for the 08CO and 08KI of one id, a blank-padded id (DKC__12),
 // a coordinate record without X and Y (no control point), an observation
-// before any set-up, a point between the backsight record and the backsight
-// itself, the backsight found through its description, the backsight
-// observed twice (one orientation record), an empty 03NM, 8-decimal prism
-// heights and "0.0" before any, a station label from its description, and a
-// set-up whose backsight is never observed and has no circle reading (no
-// orientation record). The expected book was checked line by line by hand.
+// between a set-up and its backsight record (a block without orientation), a
+// point between the backsight record and the backsight itself, the backsight
+// found through its description, the backsight observed twice (one
+// orientation record), an empty 03NM, 8-decimal prism heights and "0.0"
+// before any, a station label from its description, and a set-up whose
+// backsight is never observed and has no circle reading (no orientation
+// record). The expected book was checked line by line by hand.
 // .gre files (kind 7) use the same set-up codes.
 TEST(SdrConversion, MatchesHandCheckedBookByteForByte) {
   EXPECT_EQ(ConvertSdr(TestData("sdr/codes.sdr"), 1).book, TestData("sdr/codes.asc"));

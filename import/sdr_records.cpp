@@ -1,11 +1,11 @@
-#include "import/sdr_header.h"
+#include "import/sdr_records.h"
 
 #include <cmath>
+#include <utility>
 
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/text.h"
-#include "import/instrument_common.h"
 
 namespace kavu {
 
@@ -104,6 +104,33 @@ SdrHeader ReadSdrHeader(const std::vector<std::string>& lines, int width_default
     }
   }
   return header;
+}
+
+bool IsCoordinateCode(std::string_view code) {
+  return code == "08KI" || code == "08CO" || code == "08TP" || IsSetUpCode(code);
+}
+
+bool IsSetUpCode(std::string_view code) { return code == "02TP" || code == "02KI"; }
+
+std::string KnownPointRecord(std::string_view name, std::string_view record,
+                             const SdrLayout& layout, const SdrHeader& header) {
+  std::string_view x = TrimView(layout.x.Of(record));
+  std::string_view y = TrimView(layout.y.Of(record));
+  if (header.east_north) std::swap(x, y);
+  if (name.empty() || x.empty() || y.empty()) return {};
+  // The narrow layout keeps its height column as it stands.
+  const std::string_view h = layout.h.Of(record);
+  const Units& units = header.units;
+  return ControlPointRecord(name, units.LengthText(x), units.LengthText(y),
+                            units.LengthText(layout.width == 16 ? TrimView(h) : h));
+}
+
+Shot ReadShot(std::string_view record, const SdrLayout& layout, const Units& units) {
+  Shot shot;
+  shot.reading = units.Reading(Val(layout.reading.Of(record)));
+  shot.zenith = units.Angle(Val(layout.zenith.Of(record)));
+  shot.distance = HorizontalDistance(units.Length(Val(layout.slope.Of(record))), shot.zenith);
+  return shot;
 }
 
 std::string BlankFreeName(std::string_view name) {
