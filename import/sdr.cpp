@@ -150,6 +150,7 @@ class SdrWriter {
       AppendLine(out_, "TR " + station_name_ + " " + instrument_height_);
       station_open_ = false;
       have_backsight_ = false;
+      reference_ = 0;
     }
     Observation obs;
     const std::string id = names_.Identifier(line, layout_.target);

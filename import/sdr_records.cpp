@@ -31,47 +31,14 @@ namespace {
 // temperature, coordinate order, direction. False when a digit that matters
 // is not one the program knows.
 bool ReadUnitDigits(std::string_view digits, SdrHeader& header) {
-  bool known = true;
-  switch (digits[0]) {
-    case '1':
-      break;
-    case '2':
-      header.units.degrees_per_unit = 0.9;
-      break;
-    case '3':
-      header.units.degrees_per_unit = 360.0 / 6400;
-      break;
-    default:
-      known = false;
-  }
-  switch (digits[1]) {
-    case '1':
-      break;
-    case '2':
-      header.units.metres_per_unit = 0.3048;
-      break;
-    default:
-      known = false;
-  }
-  switch (digits[4]) {
-    case '1':
-      break;
-    case '2':
-      header.east_north = true;
-      break;
-    default:
-      known = false;
-  }
-  switch (digits[5]) {
-    case '1':
-      break;
-    case '2':
-      header.units.counter_clockwise = true;
-      break;
-    default:
-      known = false;
-  }
-  return known;
+  const char angle = digits[0], length = digits[1], order = digits[4], direction = digits[5];
+  if (angle == '2') header.units.degrees_per_unit = 0.9;
+  if (angle == '3') header.units.degrees_per_unit = 360.0 / 6400;
+  if (length == '2') header.units.metres_per_unit = 0.3048;
+  header.east_north = order == '2';
+  header.units.counter_clockwise = direction == '2';
+  auto one_of = [](char digit, char last) { return digit >= '1' && digit <= last; };
+  return one_of(angle, '3') && one_of(length, '2') && one_of(order, '2') && one_of(direction, '2');
 }
 
 }  // namespace
