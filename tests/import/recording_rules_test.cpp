@@ -22,8 +22,10 @@ constexpr double kCircleOnB = 30;
 constexpr double kTurn = 50;
 constexpr double kDistance = 40;
 constexpr double kZenith = 88;
-const double kSlope = kDistance / std::sin(kZenith * std::acos(-1.0) / 180);
-const double kSlopeToB = std::hypot(kB.x - kA.x, kB.y - kA.y);
+// The slope distance recorded for a horizontal one at the zenith kZenith.
+double Slope(double horizontal) { return horizontal / std::sin(kZenith * std::acos(-1.0) / 180); }
+const double kSlope = Slope(kDistance);
+const double kSlopeToB = Slope(std::hypot(kB.x - kA.x, kB.y - kA.y));
 const Xy kP = Polar(kA, kB, kTurn, kDistance);
 
 // How a recording states its values.
@@ -109,8 +111,7 @@ std::string Recording(const Dialect& d, const Scene& s) {
                            {z, angle(kZenith)},
                            {ha, reading(circle_reading)}});
   };
-  if (s.shoot_backsight)
-    file += shot(s.b, kSlopeToB / std::sin(kZenith * std::acos(-1.0) / 180), kCircleOnB);
+  if (s.shoot_backsight) file += shot(s.b, kSlopeToB, kCircleOnB);
   file += shot(s.p, kSlope, kCircleOnB + kTurn);
   if (s.then_setup_on_b_without_backsight) {
     file += Record(s.station, {{c[0], id(s.b)}, {c[4], len(1.5)}});
@@ -215,14 +216,13 @@ TEST_F(RecordingRules, SetJobNamesItsBacksightAsItsCoordinateRecord) {
   auto id = [](std::string_view name) {
     return std::string(16 - name.size(), ' ') + std::string(name);
   };
-  const double slope_b = kSlopeToB / std::sin(kZenith * std::acos(-1.0) / 180);
   const std::string bytes =
       Record("00NMSDR33 V04-04.02     01-Jan-24 08:00 111121", {}) +
       Record("02TP", {{5, id("STA")}, {21, f(kA.y)}, {37, f(kA.x)}, {53, f(10)}, {69, f(1.5)}}) +
       Record("08CO", {{5, id("KRY SHA")}, {21, f(kB.y)}, {37, f(kB.x)}, {53, f(12)}}) +
       Record("09F1", {{5, id("STA")},
                       {21, id("KRY SHA")},
-                      {37, f(slope_b)},
+                      {37, f(kSlopeToB)},
                       {53, f(kZenith)},
                       {69, f(kCircleOnB)}}) +
       Record("09F1", {{5, id("STA")},
