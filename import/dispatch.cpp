@@ -53,7 +53,7 @@ std::string NotFoundMessage(const std::string& path) {
   return std::string(msg::kFileNotFound) + path + "\r" + std::string(msg::kEnterNewFile);
 }
 
-using Converter = std::string (*)(std::string_view content, int kind);
+using Converter = Conversion (*)(std::string_view content, int kind);
 
 // The converter of a kind; none for the kinds whose field book must exist.
 Converter ConverterOf(int kind) {
@@ -156,7 +156,9 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
       host.MessageBox(std::string(msg::kCannotOpen) + st.filesl, MsgIcon::Critical, MsgButtons::Ok);
       return std::nullopt;
     }
-    content = convert(*raw, kind);
+    Conversion conversion = convert(*raw, kind);
+    content = std::move(conversion.book);
+    st.conversionReport = std::move(conversion.report);
     TextOut out(fieldBook);
     out.Write(*content);
     if (!out.close()) st.unwritable.push_back(fieldBook);
