@@ -4,6 +4,7 @@
 // bearings agree with the azimuths its backsight records hold, the points it
 // shot again agree with its own coordinates, and what cannot be computed is
 // reported.
+#include <cctype>
 #include <cmath>
 #include <map>
 #include <string>
@@ -128,9 +129,20 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
       EXPECT_NEAR(it->second.y, p.y, 1e-6) << p.name;
     }
 
-    // The bearings the run oriented with: from the points its companion
-    // file shows it looked up for each set-up.
-    const Book used = ReadBook(folder / (stem + ".td1"));
+    // The bearings the run oriented with: the set-ups its station listing
+    // names (kept when the run reports something), else those its companion
+    // file shows; a set-up whose shots are all angle-only is in the listing
+    // only.
+    Book used = ReadBook(folder / (stem + ".td1"));
+    if (const auto listing = ReadLines(folder / (stem + ".cpv"))) {
+      used.setups.clear();
+      for (const std::string& line : *listing) {
+        if (line.size() > 40 && std::isdigit(static_cast<unsigned char>(line[30]))) {
+          used.setups.emplace_back(Trim(line.substr(0, 12)), Trim(line.substr(12, 12)));
+        }
+      }
+      used.known = book.known;
+    }
     ASSERT_EQ(used.setups.size(), c.bearings.size());
     for (std::size_t i = 0; i < c.bearings.size(); ++i) {
       const Bearing& b = c.bearings[i];
