@@ -65,6 +65,7 @@ inline constexpr std::string_view kOr = " hoac ";
 inline constexpr std::string_view kSkippedFrom = "Cac diem mia ";
 inline constexpr std::string_view kSkippedTo = " - ";
 inline constexpr std::string_view kSkippedEnd = " khong duoc tinh";
+inline constexpr std::string_view kUnreadableDeclaration = "Khong hieu khai bao cua File: ";
 
 // Station listing.
 inline constexpr std::string_view kCpvHeader[] = {

@@ -294,6 +294,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.fsdo)) OpenKeptFile(st, st.sdoFile, st.daufile + ".sdo");
   OpenKeptFile(st, st.errFile, st.daufile + ".err");
   WriteErrorReportHeader(st.errFile);
+  for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
   if (!DocFileKhongChe(st, host, *fieldBook)) {

@@ -140,6 +140,10 @@ struct ComputationFields {
   TextOut sdoFile;  // field sketch .sdo
   TextOut cpFile;   // auxiliary-peg file .cp
 
+  // What the conversion found in the instrument file itself, for the error
+  // report.
+  std::vector<std::string> conversionReport;
+
   // Products that could not be written, named in the summary.
   std::vector<std::string> unwritable;
   // The files the run reads (chosen file, field book, common control file):

@@ -84,7 +84,7 @@ void RemoveLeftovers(const RunState& st) {
   }
 }
 
-using Converter = std::string (*)(std::string_view content, int kind);
+using Converter = Conversion (*)(std::string_view content, int kind);
 
 // The converter of a kind; none for the kinds whose field book must exist.
 Converter ConverterOf(int kind) {
@@ -217,7 +217,9 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
       host.MessageBox(std::string(msg::kCannotOpen) + st.filesl, MsgIcon::Critical, MsgButtons::Ok);
       return std::nullopt;
     }
-    content = convert(*raw, kind);
+    Conversion conversion = convert(*raw, kind);
+    content = std::move(conversion.book);
+    st.conversionReport = std::move(conversion.report);
     TextOut out(fieldBook);
     out.Write(*content);
     if (!out.commit()) st.unwritable.push_back(fieldBook);

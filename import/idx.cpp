@@ -1,8 +1,10 @@
 // Topcom keyword files (.idx): SETUP sections with STN_ID and the instrument
 // height, then SLOPE observation lines "no, "name", cfg, Hz, Vz, SDist, RefHt,
 // ..." closed by END SLOPE. Angles are decimal degrees unless the file's
-// UNITS declare "ANGULAR DMS" (D.MMSSss); distances are slope distances,
-// reduced to horizontal here.
+// UNITS declare "ANGULAR DMS" (D.MMSSss) or "ANGULAR GON", lengths metres
+// unless "LINEAR FEET"; distances are slope distances, reduced to horizontal
+// here, and readings are turned so that the orientation shot reads 0.
+#include <algorithm>
 #include <array>
 #include <cmath>
 #include <cstddef>
@@ -16,6 +18,7 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
@@ -45,6 +48,8 @@ bool IsStationLine(std::string_view line) {
   const Words words = FirstWords(line);
   return words.count > 0 && words.word[0] == "STN_ID";
 }
+
+enum class AngleUnit { kDegrees, kDms, kGon };
 
 // Comma form: blanks and tabs dropped, fields split at ",". Only the seven
 // fields an observation uses are kept; count is the line's full field count.
@@ -84,46 +89,133 @@ double DmsDegrees(std::string_view text) {
   return value < 0 ? -degrees : degrees;
 }
 
-std::string DetailRecord(const CommaLine& obs, bool dms) {
-  auto angle = [dms](std::string_view text) { return dms ? DmsDegrees(text) : Val(text); };
-  const double reading = angle(obs.field[3]);
-  const double zenith = angle(obs.field[4]);
-  const double slope = Val(obs.field[5]);
-  const double prism = std::fabs(Val(obs.field[6]));
-  const double horizontal = std::fabs(HorizontalDistance(slope, zenith));
+// An observation as read, and reduced to face 1.
+struct Pointing {
+  std::string name;
+  double reading = 0, zenith = 0, slope = 0, prism = 0;
+  bool face2 = false;
+};
+
+struct Declarations {
+  AngleUnit angle = AngleUnit::kDegrees;
+  Units units;
+};
+
+Pointing ReadPointing(const CommaLine& obs, const Declarations& declared) {
+  auto angle = [&declared](std::string_view text) {
+    switch (declared.angle) {
+      case AngleUnit::kDms:
+        return DmsDegrees(text);
+      case AngleUnit::kGon:
+        return Val(text) * 0.9;
+      default:
+        return Val(text);
+    }
+  };
+  Pointing shot;
+  shot.name = BlankFreeName(Unquote(obs.field[1]));
+  shot.reading = angle(obs.field[3]);
+  shot.zenith = angle(obs.field[4]);
+  shot.slope = declared.units.Length(Val(obs.field[5]));
+  shot.prism = declared.units.Length(std::fabs(Val(obs.field[6])));
+  // Face 2: the telescope transited, the circle read half a turn on.
+  if (shot.zenith > 180) {
+    shot.face2 = true;
+    shot.reading = std::fmod(shot.reading + 180, 360.0);
+    shot.zenith = 360 - shot.zenith;
+  }
+  return shot;
+}
+
+// The mean of the two faces of one pointing.
+Pointing MeanOfFaces(const Pointing& a, const Pointing& b) {
+  Pointing mean = a;
+  double gap = b.reading - a.reading;
+  if (gap > 180) gap -= 360;
+  if (gap < -180) gap += 360;
+  mean.reading = std::fmod(a.reading + gap / 2 + 360, 360.0);
+  mean.zenith = (a.zenith + b.zenith) / 2;
+  // A face without a distance does not halve the other's.
+  mean.slope = a.slope > 0 && b.slope > 0 ? (a.slope + b.slope) / 2 : std::max(a.slope, b.slope);
+  return mean;
+}
+
+std::string DetailRecord(const Pointing& shot, double reference) {
+  const double horizontal = std::fabs(HorizontalDistance(shot.slope, shot.zenith));
   // The name is padded to 5 columns but never cut: 8-digit point numbers are
   // common and cutting them would merge different points.
-  return LString(Unquote(obs.field[1]), 5) + GocSt(reading) + DistanceText(horizontal) +
-         GocSt(zenith) + PrismHeightText(NumberText(prism));
+  return LString(shot.name, 5) + GocSt(TurnReading(shot.reading, reference)) +
+         DistanceText(horizontal) + GocSt(shot.zenith) + PrismHeightText(NumberText(shot.prism));
+}
+
+// A text without the blanks and tabs around it.
+std::string_view TrimBlanks(std::string_view text) {
+  while (!text.empty() && (text.front() == ' ' || text.front() == '\t')) text.remove_prefix(1);
+  while (!text.empty() && (text.back() == ' ' || text.back() == '\t')) text.remove_suffix(1);
+  return text;
+}
+
+// The text after a line's first word, without its quotes: a quoted name
+// with blanks inside stays one name.
+std::string_view QuotedRest(std::string_view line, std::string_view first) {
+  std::string_view rest = TrimBlanks(line.substr(line.find(first) + first.size()));
+  if (rest.size() >= 2 && rest.front() == '"' && rest.back() == '"') {
+    rest = rest.substr(1, rest.size() - 2);
+  }
+  return rest;
+}
+
+// Reads a UNITS declaration; false when the unit is not one the program
+// knows.
+bool Declare(const Words& words, Declarations& declared) {
+  const std::string_view unit = words.count > 1 ? words.word[1] : std::string_view();
+  if (words.word[0] == "ANGULAR") {
+    if (unit == "DMS") {
+      declared.angle = AngleUnit::kDms;
+    } else if (unit == "DEG") {
+      declared.angle = AngleUnit::kDegrees;
+    } else if (unit == "GON") {
+      declared.angle = AngleUnit::kGon;
+    } else {
+      return false;
+    }
+  } else if (words.word[0] == "LINEAR") {
+    if (unit == "METRE" || unit == "METER") {
+      declared.units.metres_per_unit = 1;
+    } else if (unit == "FEET" || unit == "FOOT") {
+      declared.units.metres_per_unit = 0.3048;
+    } else {
+      return false;
+    }
+  }
+  return true;
 }
 
 }  // namespace
 
-std::string ConvertIdx(std::string_view content) {
+Conversion ConvertIdx(std::string_view content) {
   const std::vector<std::string> lines = SplitLines(content);
   const std::size_t n = lines.size();
-  std::string book;
-  auto put = [&book](std::string_view record) { AppendLine(book, record); };
+  Conversion result;
+  auto put = [&result](std::string_view record) { AppendLine(result.book, record); };
 
   // A height line without a value keeps the height of the station before.
   double height = 0;
-  bool dms = false;
+  Declarations declared;
   std::size_t i = 0;
   while (i < n) {
-    const Words station = FirstWords(lines[i++]);
-    if (station.count > 0 && station.word[0] == "ANGULAR") {
-      dms = station.count > 1 && station.word[1] == "DMS";
+    const std::string_view line = lines[i++];
+    const Words station = FirstWords(line);
+    if (station.count > 0 && !Declare(station, declared)) {
+      result.report.push_back(UnreadableDeclaration(TrimBlanks(line)));
     }
     if (station.count == 0 || station.word[0] != "STN_ID") continue;
-    const std::string label =
-        Trim(FixedWidth(station.count > 1 ? Unquote(station.word[1]) : "", 12));
+    const std::string label = BlankFreeName(QuotedRest(line, "STN_ID"));
     if (i >= n) break;  // the file ends right after STN_ID: nothing to write
 
+    // The height with or without the ";" after it.
     const Words height_line = FirstWords(lines[i++]);
-    if (height_line.count > 1) {
-      const std::string_view text = height_line.word[1];
-      height = Val(text.substr(0, text.size() - 1));  // drops the ";" after it
-    }
+    if (height_line.count > 1) height = declared.units.Length(Val(height_line.word[1]));
     put("TR " + label + " " + ReportNumber(height));
 
     i += 2;  // two lines of the set-up that carry nothing we use
@@ -131,10 +223,10 @@ std::string ConvertIdx(std::string_view content) {
     // A new STN_ID before any observation: this station has none.
     if (IsStationLine(lines[i])) continue;
 
-    // The first observation names the orientation point.
-    const CommaLine first = CommaForm(lines[i]);
-    put("DKD " + Trim(first.count > 1 ? Unquote(first.field[1]) : ""));
-
+    // The set-up's observations, each reduced to face 1; the two faces of
+    // one pointing, shot one after the other, become their mean.
+    std::vector<Pointing> shots;
+    bool paired = false;
     for (; i < n; ++i) {
       // A STN_ID line starts the next set-up even when END SLOPE is missing.
       if (IsStationLine(lines[i])) break;
@@ -144,10 +236,23 @@ std::string ConvertIdx(std::string_view content) {
         break;
       }
       if (obs.count < 7) continue;  // not an observation: skipped
-      put(DetailRecord(obs, dms));
+      Pointing shot = ReadPointing(obs, declared);
+      if (!shots.empty() && !paired && shots.back().name == shot.name &&
+          shots.back().face2 != shot.face2) {
+        shots.back() = MeanOfFaces(shots.back(), shot);
+        paired = true;
+      } else {
+        shots.push_back(std::move(shot));
+        paired = false;
+      }
     }
+    // The first observation is the orientation: readings turn so that it
+    // reads 0.
+    put("DKD " + (shots.empty() ? std::string() : shots.front().name));
+    const double reference = shots.empty() ? 0 : shots.front().reading;
+    for (const Pointing& shot : shots) put(DetailRecord(shot, reference));
   }
-  return book;
+  return result;
 }
 
 }  // namespace kavu

@@ -43,6 +43,12 @@ std::string PrismHeightText(std::string_view height) {
 
 std::string PointNumberText(std::string_view identifier) { return NumberText(Val(identifier)); }
 
+std::string ControlPointRecord(std::string_view name, std::string_view x, std::string_view y,
+                               std::string_view h) {
+  return "TR " + std::string(name) + " " + RString(TrimView(x), 11) + " " +
+         RString(TrimView(y), 11) + " " + LString(h, 10);
+}
+
 void AppendLine(std::string& out, std::string_view line) {
   out += line;
   out += "\r\n";

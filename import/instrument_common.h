@@ -78,6 +78,11 @@ std::string PrismHeightText(std::string_view height);
 // (0012 -> 12, A7 -> 0, 0.5 -> .5).
 std::string PointNumberText(std::string_view identifier);
 
+// A control-point record: "TR " + name, then X and Y right-aligned in 11
+// columns after a blank each, and H in 10; a longer text is written whole.
+std::string ControlPointRecord(std::string_view name, std::string_view x, std::string_view y,
+                               std::string_view h);
+
 // Appends a field-book line with its CR LF.
 void AppendLine(std::string& out, std::string_view line);
 

@@ -1,7 +1,10 @@
-// SDR field books with 4-character point identifiers and 10-character
-// numbers. The first pass writes the points of known coordinates as control
-// points; the second walks the set-ups in file order.
+// SDR-family field books: fixed-column records with 4-character point
+// identifiers and 10-character numbers, or 16-character identifiers and
+// numbers (the Sokkia layout), as the header declares. The first pass writes
+// every point of known coordinates the recording holds, set-ups included, as
+// control points; the second walks the set-ups in file order.
 
+#include <optional>
 #include <string>
 #include <string_view>
 #include <unordered_map>
@@ -13,117 +16,163 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
 
-// Labels of the points of known coordinates by identifier. Keyed-in points
-// ("08KI") are listed before computed ones ("08CO"), and a lookup takes the
-// last listed row: a computed point wins over a keyed-in one of the same id.
-using LabelTable = std::unordered_map<std::string, std::string>;
+// The names of the points: one per identifier through the whole recording.
+// In the wide layout a point is named by its identifier. In the narrow one a
+// point with coordinates is named by the first description of 3 characters
+// or more that its coordinate records give it, else "DKC" + its identifier.
+class Names {
+ public:
+  Names(const std::vector<std::string>& lines, const SdrLayout& layout)
+      : wide_(layout.width == 16) {
+    if (wide_) return;
+    for (const std::string& line : lines) {
+      const std::string_view code = RecordCode(line);
+      if (!IsCoordinateCode(code)) continue;
+      const std::string_view description =
+          IsSetUpCode(code) ? layout.description.Of(line) : ColumnsFrom(line, 49);
+      if (TrimView(layout.x.Of(line)).empty() || TrimView(layout.y.Of(line)).empty()) continue;
+      const std::string id = Identifier(line, layout.id);
+      auto [it, fresh] = labels_.try_emplace(id);
+      if (fresh || it->second.empty()) {
+        const std::string_view text = TrimView(description);
+        it->second = text.size() < 3 ? std::string() : Trim(FixedWidth(text, 12));
+      }
+    }
+    for (auto& [id, label] : labels_) {
+      label = BlankFreeName(label.empty() ? "DKC" + id : label);
+    }
+  }
 
-std::string Identifier(std::string_view line, std::size_t from) {
-  return FixedWidth(Columns(line, from, from + 3), 4);
-}
+  std::string Identifier(std::string_view line, Span span) const {
+    return wide_ ? Trim(span.Of(line)) : FixedWidth(span.Of(line), 4);
+  }
+  // The name of a point with coordinates, or nullptr.
+  const std::string* Known(const std::string& id) const {
+    const auto it = labels_.find(id);
+    return it == labels_.end() ? nullptr : &it->second;
+  }
+  // Any point named in a set-up or backsight record.
+  std::string Of(const std::string& id) const {
+    if (wide_) return BlankFreeName(id);
+    if (const std::string* label = Known(id)) return *label;
+    return BlankFreeName("DKC" + id);
+  }
 
-const std::string* FindLabel(const LabelTable& labels, const std::string& id) {
-  auto it = labels.find(id);
-  return it == labels.end() ? nullptr : &it->second;
-}
+ private:
+  bool wide_;
+  std::unordered_map<std::string, std::string> labels_;
+};
 
-// One observation waiting for its detail record.
 struct Observation {
-  std::string number;  // point number, 4 characters
-  double reading = 0;  // horizontal circle, decimal degrees
-  double distance = 0;
-  double zenith = 0;
-  std::string target_height;
+  std::string name;
+  Shot shot;
+  std::string prism_height;
   std::string description;
 };
 
 class SdrWriter {
  public:
-  SdrWriter(std::string& out, const LabelTable& labels, int kind) : out_(out), labels_(labels) {
-    if (kind == 1 || kind == 7) {
-      station_code_ = "02TP";
-      backsight_code_ = "07TP";
-    } else if (kind == 8) {
-      station_code_ = "02KI";
-      backsight_code_ = "07KI";
-    }
+  SdrWriter(std::string& out, const Names& names, const SdrHeader& header, const SdrLayout& layout,
+            int kind)
+      : out_(out),
+        names_(names),
+        header_(header),
+        layout_(layout),
+        wide_(layout.width == 16),
+        setups_(kind == 1 || kind == 2 || kind == 7 || kind == 8),
+        keyed_only_(kind == 8) {}
+
+  bool IsStation(std::string_view code) const {
+    return setups_ && (code == "02KI" || (!keyed_only_ && code == "02TP"));
+  }
+  bool IsBacksight(std::string_view code) const {
+    return setups_ && (code == "07KI" || (!keyed_only_ && code == "07TP"));
   }
 
   void Line(std::string_view line) {
     const std::string_view code = RecordCode(line);
-    if (!station_code_.empty() && code == station_code_) {
+    if (IsStation(code)) {
       Station(line);
-    } else if (!backsight_code_.empty() && code == backsight_code_) {
+    } else if (IsBacksight(code)) {
       Backsight(line);
     } else if (code == "03NM") {
-      std::string height = Trim(Columns(line, 5, 14));
-      target_height_ = PrismHeightText(height.empty() ? "0.0" : height);
+      const std::string height = Trim(layout_.prism.Of(line));
+      prism_height_ = height.empty() ? "0.0" : header_.units.LengthText(height);
     } else if (code == "09F1") {
       Observe(line);
     }
   }
 
   // The end of the file closes the last set-up.
-  void Finish() { CloseOrientation(); }
+  void Finish() { CloseSetUp(); }
 
  private:
   void Station(std::string_view line) {
-    CloseOrientation();
-    const std::string id = Identifier(line, 5);
-    instrument_height_ = Trim(Columns(line, 39, 48));
+    CloseSetUp();
+    const std::string id = names_.Identifier(line, layout_.id);
+    instrument_height_ = header_.units.LengthText(Trim(layout_.height.Of(line)));
     if (instrument_height_.empty()) instrument_height_ = "0.0";
-    if (const std::string* label = FindLabel(labels_, id)) {
-      station_label_ = *label;
-    } else if (Trim(Columns(line, 49, 65)).size() > 2) {
-      station_label_ = FixedWidth(Columns(line, 49, 60), 12);
+    const std::string_view description = TrimView(layout_.description.Of(line));
+    if (!wide_ && names_.Known(id) == nullptr && description.size() > 2) {
+      station_name_ = BlankFreeName(Trim(FixedWidth(Columns(line, 49, 60), 12)));
     } else {
-      station_label_ = FixedWidth("DKC" + id, 12);
+      station_name_ = names_.Of(id);
     }
+    station_open_ = true;
   }
 
   void Backsight(std::string_view line) {
-    CloseOrientation();
-    AppendLine(out_, "TR " + Trim(station_label_) + " " + instrument_height_);
-    backsight_id_ = Identifier(line, 9);
-    if (const std::string* label = FindLabel(labels_, backsight_id_)) {
-      backsight_label_ = *label;
-      backsight_found_ = true;
-    } else {
-      backsight_label_ = FixedWidth("DKC" + backsight_id_, 12);
-      backsight_found_ = false;
-    }
+    CloseSetUp();
+    AppendLine(out_, "TR " + station_name_ + " " + instrument_height_);
+    station_open_ = false;
+    backsight_id_ = names_.Identifier(line, layout_.target);
+    backsight_name_ = names_.Of(backsight_id_);
+    backsight_found_ = wide_ || names_.Known(backsight_id_) != nullptr;
+    circle_.reset();
+    const std::string_view circle = layout_.circle.Of(line);
+    if (HasNumber(circle)) circle_ = header_.units.Reading(Val(circle));
     reference_ = 0;
     have_backsight_ = true;
+    oriented_ = false;
     held_.Await();
   }
 
   void Observe(std::string_view line) {
+    // A set-up without backsight record: its points follow its station
+    // record with no orientation, so the run reports them instead of
+    // computing them from the set-up before.
+    if (station_open_) {
+      AppendLine(out_, "TR " + station_name_ + " " + instrument_height_);
+      station_open_ = false;
+      have_backsight_ = false;
+      reference_ = 0;
+    }
     Observation obs;
-    const std::string id = Identifier(line, 9);
-    obs.number = FixedWidth(PointNumberText(id), 4);
-    const double slope = Val(Columns(line, 13, 22));
-    obs.zenith = Val(Columns(line, 23, 32));
-    obs.reading = Val(Columns(line, 33, 42));
-    obs.distance = HorizontalDistance(slope, obs.zenith);
-    obs.target_height = target_height_;
-    const std::string note = Trim(Columns(line, 43, 59));
-    if (const std::string* label = FindLabel(labels_, id)) {
-      obs.description = Trim(*label);
+    const std::string id = names_.Identifier(line, layout_.target);
+    obs.shot = ReadShot(line, layout_, header_.units);
+    obs.prism_height = prism_height_;
+    const std::string* known = names_.Known(id);
+    if (wide_) {
+      obs.name = BlankFreeName(id);
     } else {
-      obs.description = note;
+      obs.name = known != nullptr ? *known : FixedWidth(PointNumberText(id), 4);
+      obs.description = known != nullptr ? *known : Trim(layout_.note.Of(line));
     }
 
     if (have_backsight_ && id == backsight_id_) {
-      reference_ = obs.reading;
-      if (!backsight_found_ && note.size() > 2) backsight_label_ = FixedWidth(note, 12);
-      // Every reading of the backsight writes its orientation record; the
-      // points held for it follow.
-      AppendLine(out_, "DKD " + Trim(backsight_label_));
-      held_.Release();
+      reference_ = obs.shot.reading;
+      if (!oriented_) {
+        const std::string note = Trim(layout_.note.Of(line));
+        if (!backsight_found_ && note.size() > 2) {
+          backsight_name_ = BlankFreeName(Trim(FixedWidth(note, 12)));
+        }
+        Orient();
+      }
     } else if (held_.awaiting()) {
       held_.Hold(std::move(obs));
       return;
@@ -131,71 +180,89 @@ class SdrWriter {
     Write(obs);
   }
 
-  // A set-up whose backsight was never observed still gets its orientation
-  // record, and its points keep their circle readings.
-  void CloseOrientation() {
-    if (!held_.awaiting()) return;
-    AppendLine(out_, "DKD " + Trim(backsight_label_));
+  // The orientation record, then the points that waited for it.
+  void Orient() {
+    AppendLine(out_, "DKD " + backsight_name_);
+    oriented_ = true;
     held_.Release();
   }
 
+  // A set-up whose backsight was never observed is turned by the circle
+  // reading its backsight record holds; without one it gets no orientation
+  // record, and the run reports its points as not computed.
+  void CloseSetUp() {
+    if (!held_.awaiting()) return;
+    if (circle_) {
+      reference_ = *circle_;
+      Orient();
+    } else {
+      held_.Release();
+    }
+  }
+
   void Write(const Observation& obs) {
-    AppendLine(out_, obs.number + GocSt(TurnReading(obs.reading, reference_)) +
-                         DistanceText(obs.distance) + GocSt(obs.zenith) + obs.target_height + " " +
-                         obs.description);
+    const Shot& shot = obs.shot;
+    std::string record =
+        LString(obs.name, wide_ ? 10 : 4) + GocSt(TurnReading(shot.reading, reference_)) +
+        DistanceText(shot.distance) + GocSt(shot.zenith) + PrismHeightText(obs.prism_height);
+    // The 4-column book carries a description; the 16-column one none.
+    if (!wide_) record += " " + obs.description;
+    AppendLine(out_, record);
   }
 
   std::string& out_;
-  const LabelTable& labels_;
-  std::string station_code_;
-  std::string backsight_code_;
+  const Names& names_;
+  const SdrHeader& header_;
+  const SdrLayout& layout_;
+  bool wide_;
+  bool setups_;      // kinds whose set-up records are read
+  bool keyed_only_;  // only the keyed-in set-up codes
 
-  std::string station_label_;
+  std::string station_name_;
   std::string instrument_height_;
   std::string backsight_id_;
-  std::string backsight_label_;
+  std::string backsight_name_;
   bool backsight_found_ = false;
+  bool station_open_ = false;    // a set-up record waits for its backsight record
   bool have_backsight_ = false;  // no observation is the backsight before one is named
+  bool oriented_ = false;
+  std::optional<double> circle_;  // circle reading on the backsight, as recorded
   double reference_ = 0;
-  std::string target_height_;  // empty until the first "03NM"
+  std::string prism_height_ = "0.0";
   HeldObservations<Observation> held_{[this](const Observation& obs) { Write(obs); }};
 };
 
-}  // namespace
-
-std::string ConvertSdr(std::string_view content, int kind) {
+Conversion ConvertSdrFamily(std::string_view content, int kind, int width_default) {
   const std::vector<std::string> lines = SplitLines(content);
-  std::string out;
+  Conversion result;
+  const SdrHeader header = ReadSdrHeader(lines, width_default);
+  result.report = header.report;
+  const SdrLayout& layout = header.width == 16 ? kWideLayout : kNarrowLayout;
+  const Names names(lines, layout);
 
-  // Pass 1: control points in file order; the label table lists "08KI" rows
-  // before "08CO" rows.
-  LabelTable labels;
-  std::vector<std::pair<std::string, std::string>> computed;
+  // Pass 1: every coordinate record, set-ups included, in file order.
   for (const std::string& line : lines) {
-    const std::string_view code = RecordCode(line);
-    if (code != "08KI" && code != "08CO") continue;
-    const std::string id = Identifier(line, 5);
-    const std::string description = Trim(ColumnsFrom(line, 49));
-    const std::string label = FixedWidth(description.size() < 3 ? "DKC" + id : description, 12);
-    if (code == "08KI") {
-      labels[id] = label;
-    } else {
-      computed.emplace_back(id, label);
-    }
-    const std::string x = FixedWidth(Columns(line, 9, 18), 10);
-    const std::string y = FixedWidth(Columns(line, 19, 28), 10);
-    // Without both coordinates the record would read back as a station.
-    if (TrimView(x).empty() || TrimView(y).empty()) continue;
-    AppendLine(out, "TR " + Trim(label) + RString(x, 12) + RString(y, 12) + " " +
-                        FixedWidth(Columns(line, 29, 38), 10));
+    if (!IsCoordinateCode(RecordCode(line))) continue;
+    const std::string record =
+        KnownPointRecord(names.Of(names.Identifier(line, layout.id)), line, layout, header);
+    if (!record.empty()) AppendLine(result.book, record);
   }
-  for (auto& [id, label] : computed) labels[id] = std::move(label);
 
   // Pass 2: the set-ups.
-  SdrWriter writer(out, labels, kind);
+  SdrWriter writer(result.book, names, header, layout, kind);
   for (const std::string& line : lines) writer.Line(line);
   writer.Finish();
-  return out;
+  return result;
+}
+
+}  // namespace
+
+Conversion ConvertSdr(std::string_view content, int kind) {
+  return ConvertSdrFamily(content, kind, 4);
+}
+
+Conversion ConvertObs(std::string_view content, int kind) {
+  return ConvertSdrFamily(content, kind, 16);
 }
 
 }  // namespace kavu

@@ -1,8 +1,9 @@
 // SET raw files: the SDR record codes with 16-character fields; every set-up
 // carries its station's coordinates, and the first observation after a set-up
-// is the one on the orientation point. The first pass writes the stations as
-// control points and keeps the set-ups and observations with the prism height
-// in force; the second writes the station blocks from them.
+// is the one on the orientation point. The first pass writes every point of
+// known coordinates as a control point and keeps the set-ups and observations
+// with the prism height in force; the second writes the station blocks from
+// them. A point is named by its identifier throughout.
 
 #include <string>
 #include <string_view>
@@ -14,6 +15,7 @@
 #include "core/text.h"
 #include "import/converters.h"
 #include "import/instrument_common.h"
+#include "import/sdr_records.h"
 
 namespace kavu {
 namespace {
@@ -26,44 +28,45 @@ struct Entry {
   std::string prism_height;
 };
 
-std::string StationLabel(std::string_view setup) {
+// A set-up without identifier keeps the label of its description, or "DKC".
+std::string StationName(std::string_view setup) {
+  const std::string_view id = TrimView(Columns(setup, 5, 20));
+  if (!id.empty()) return BlankFreeName(id);
   const std::string_view description = TrimView(Columns(setup, 85, 100));
-  if (description.size() < 3) {
-    return FixedWidth("DKC" + FixedWidth(TrimView(Columns(setup, 5, 20)), 5), 12);
-  }
-  return FixedWidth(description, 12);
+  return BlankFreeName(description.size() < 3 ? "DKC" : Trim(FixedWidth(description, 12)));
 }
 
-std::string InstrumentHeight(std::string_view setup) {
-  std::string height = Trim(Columns(setup, 69, 84));
-  return height.empty() ? "0.0" : height;
+// The target of an observation; one without identifier keeps its code.
+std::string TargetName(std::string_view observation) {
+  const std::string_view id = TrimView(Columns(observation, 21, 36));
+  return BlankFreeName(id.empty() ? Trim(FixedWidth(TrimView(Columns(observation, 85, 100)), 12))
+                                  : id);
 }
 
 }  // namespace
 
-std::string ConvertSet(std::string_view content) {
+Conversion ConvertSet(std::string_view content) {
   const std::vector<std::string> lines = SplitLines(content);
-  std::string out;
+  Conversion result;
+  const SdrHeader header = ReadSdrHeader(lines, 16);
+  result.report = header.report;
+  const Units& units = header.units;
+  auto put = [&result](std::string_view record) { AppendLine(result.book, record); };
 
-  // Pass 1.
+  // Pass 1: coordinates of set-ups and of every coordinate record.
   std::vector<Entry> entries;
   std::string prism_height;
   for (const std::string& line : lines) {
     const std::string_view code = RecordCode(line);
-    if (code == "02TP") {
-      const std::string_view x = TrimView(Columns(line, 21, 36));
-      const std::string_view y = TrimView(Columns(line, 37, 52));
-      // Without both coordinates the record would read back as a station.
-      if (!x.empty() && !y.empty()) {
-        AppendLine(out, "TR " + StationLabel(line) + " " + FixedWidth(x, 11) + " " +
-                            FixedWidth(y, 10) + " " +
-                            FixedWidth(TrimView(Columns(line, 53, 68)), 10));
-      }
-      entries.push_back({line, true, {}});
+    const bool setup = code == "02TP";
+    if (setup || (IsCoordinateCode(code) && !IsSetUpCode(code))) {
+      const std::string record = KnownPointRecord(StationName(line), line, kWideLayout, header);
+      if (!record.empty()) put(record);
+      if (setup) entries.push_back({line, true, {}});
     } else if (code == "03NM") {
-      prism_height = Trim(Columns(line, 5, 20));
+      prism_height = units.LengthText(Trim(Columns(line, 5, 20)));
     } else if (code == "09F1") {
-      entries.push_back({line, false, prism_height});
+      entries.push_back({line, false, prism_height.empty() ? "0.0" : prism_height});
     }
   }
 
@@ -78,41 +81,30 @@ std::string ConvertSet(std::string_view content) {
     ++i;
     if (i >= entries.size()) break;
 
-    const std::string station_label = StationLabel(setup);
     const Entry& orientation = entries[i];
-    const std::string_view ol = orientation.line;
-    const std::string orientation_id = FixedWidth(TrimView(Columns(ol, 32, 36)), 5);
-    std::string orientation_label = FixedWidth(TrimView(Columns(ol, 85, 100)), 12);
-    if (orientation_label == station_label || TrimView(orientation_label).size() < 3) {
-      orientation_label = FixedWidth("DKC" + orientation_id, 12);
-    }
-    const double reference = Val(Columns(ol, 69, 84));
-    const double zenith = Val(Columns(ol, 53, 68));
-    const double distance = HorizontalDistance(Val(Columns(ol, 37, 52)), zenith);
+    const std::string orientation_name = TargetName(orientation.line);
+    const Shot first = ReadShot(orientation.line, kWideLayout, units);
+    std::string instrument_height = units.LengthText(Trim(Columns(setup, 69, 84)));
+    if (instrument_height.empty()) instrument_height = "0.0";
 
-    AppendLine(out, "TR " + station_label + " " + InstrumentHeight(setup));
-    AppendLine(out, "DKD " + orientation_label);
-    // An orientation shot before any prism height gets a blank one (its
-    // label then stands in that place); the other points get 0.0.
-    AppendLine(out, LString(FixedWidth(PointNumberText(orientation_id), 4), 6) + RString("0", 9) +
-                        DistanceText(distance) + GocSt(zenith) +
-                        PrismHeightText(Trim(orientation.prism_height)) + " " + orientation_label);
+    put("TR " + StationName(setup) + " " + instrument_height);
+    put("DKD " + orientation_name);
+    // The orientation shot names its point once more as its code: the run
+    // checks the orientation distance with it.
+    put(LString(orientation_name, 6) + RString("0", 9) + DistanceText(first.distance) +
+        GocSt(first.zenith) + PrismHeightText(orientation.prism_height) + " " + orientation_name);
     ++i;
 
     for (; i < entries.size() && !entries[i].setup; ++i) {
       const std::string_view line = entries[i].line;
-      const std::string name = FixedWidth(TrimView(Columns(line, 21, 36)), 5);
-      const double z = Val(Columns(line, 53, 68));
-      const double hd = HorizontalDistance(Val(Columns(line, 37, 52)), z);
-      const double reading = TurnReading(Val(Columns(line, 69, 84)), reference);
-      std::string height = Trim(entries[i].prism_height);
-      if (height.empty()) height = "0.0";
-      AppendLine(out, LString(name, 6) + GocSt(reading) + DistanceText(hd) + GocSt(z) +
-                          PrismHeightText(height) + " " +
-                          FixedWidth(TrimView(Columns(line, 85, 100)), 12));
+      const Shot shot = ReadShot(line, kWideLayout, units);
+      put(LString(TargetName(line), 6) + GocSt(TurnReading(shot.reading, first.reading)) +
+          DistanceText(shot.distance) + GocSt(shot.zenith) +
+          PrismHeightText(entries[i].prism_height) + " " +
+          FixedWidth(TrimView(Columns(line, 85, 100)), 12));
     }
   }
-  return out;
+  return result;
 }
 
 }  // namespace kavu

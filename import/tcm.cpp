@@ -25,10 +25,14 @@ std::string Field(std::string_view line, std::size_t first, std::size_t last) {
 
 std::string OrDefault(std::string text) { return text.empty() ? "0.0" : text; }
 
-// A packed angle split as "DDD" and "MMSS"; nothing or zero reads "0".
-std::string PackedAngle(std::string_view line, std::size_t degrees_from, std::size_t rest_from) {
+// A packed angle split as "DDD" and "MMSS"; zero reads "0". A blank one
+// reads "0" too, unless it must stay blank (a zenith: a height from nothing
+// would look real, while a blank field makes the run report the record).
+std::string PackedAngle(std::string_view line, std::size_t degrees_from, std::size_t rest_from,
+                        bool blank_stays = false) {
   std::string text =
       Field(line, degrees_from, degrees_from + 3) + Field(line, rest_from, rest_from + 3);
+  if (blank_stays && text.empty()) return text;
   return Val(text) == 0 ? "0" : text;
 }
 
@@ -52,7 +56,7 @@ Record ReadRecord(std::string_view line) {
   }
   record.number = FixedWidth(Field(line, 26, 31), 6);
   record.reading = PackedAngle(line, 32, 37);
-  record.zenith = PackedAngle(line, 41, 46);
+  record.zenith = PackedAngle(line, 41, 46, true);
   record.distance = OrDefault(Field(line, 59, 67));
   record.prism = OrDefault(Field(line, 68, 73));
   std::string description = Field(line, 75, 84);
@@ -106,7 +110,7 @@ class Walk {
 
 }  // namespace
 
-std::string ConvertTcm(std::string_view content) {
+Conversion ConvertTcm(std::string_view content) {
   const std::vector<std::string> lines = SplitLines(content);
   Walk walk;
   // Records stream through a one-record look-ahead: no table, no limit.
@@ -120,7 +124,7 @@ std::string ConvertTcm(std::string_view content) {
     has_pending = true;
   }
   if (has_pending) walk.Step(pending, nullptr);
-  return walk.Take();
+  return {walk.Take(), {}};
 }
 
 }  // namespace kavu

@@ -28,10 +28,13 @@ def main():
     rng = random.Random(seed)
     lines = []
     controls = []
+    # A job of a few hundred metres somewhere in the national grid.
+    x0 = rng.uniform(1.0e6, 2.5e6)
+    y0 = rng.uniform(3.0e5, 7.0e5)
     for k in range(rng.randint(2, 8)):
         name = rng.choice(["K", "DC", "GPS", "IV-"]) + str(k)
-        x = f"{rng.uniform(1e6, 2.5e6):.{rng.randint(0, 4)}f}"
-        y = f"{rng.uniform(3e5, 7e5):.{rng.randint(0, 4)}f}"
+        x = f"{x0 + rng.uniform(-500, 500):.{rng.randint(0, 3)}f}"
+        y = f"{y0 + rng.uniform(-500, 500):.{rng.randint(0, 3)}f}"
         h = f" {rng.uniform(0, 50):.3f}" if rng.random() < 0.7 else ""
         controls.append(name)
         lines.append(f"TR {name} {x} {y}{h}")

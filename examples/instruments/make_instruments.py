@@ -107,7 +107,7 @@ def make_sdr():
 
 
 def make_obs():
-    lines = ["00NMSDR33  V04-04.34    01-Jan-24 08:00 111121"]
+    lines = ["00NMSDR33  V04-04.34    01-Jan-24 08:00 111111"]
     for name, (x, y, h) in KNOWN.items():
         lines.append(rec("08KI", [(5, r16(name)), (21, f16(x)), (37, f16(y)), (53, f16(h))]))
     for station, ih, backsight, zero, obs in SETUPS:
@@ -134,7 +134,7 @@ def make_set():
         ("KC02", 1.520, "KC01", 12.0, [("KC01", 1.600), ("103", 1.600)]),
         ("KC03", 1.450, "KC01", 301.5, [("KC01", 1.700), ("105", 1.700), ("106", 1.800)]),
     ]
-    lines = ["00NMSDR33 V04-04.02     01-Jan-24 08:00 211111"]
+    lines = ["00NMSDR33 V04-04.02     01-Jan-24 08:00 111111"]
     for station, ih, backsight, zero, obs in setups:
         xs, ys, hs = point(station)
         lines.append(rec("02TP", [(5, r16(IDS[station])), (21, f16(xs)), (37, f16(ys)),

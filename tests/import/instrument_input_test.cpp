@@ -18,12 +18,12 @@ struct Converter {
 };
 
 const Converter kConverters[] = {
-    {"sdr", [](std::string_view file) { return ConvertSdr(file, 1); }},
-    {"gre", [](std::string_view file) { return ConvertSdr(file, 7); }},
-    {"obs", [](std::string_view file) { return ConvertObs(file, 2); }},
-    {"set", [](std::string_view file) { return ConvertSet(file); }},
-    {"idx", [](std::string_view file) { return ConvertIdx(file); }},
-    {"tcm", [](std::string_view file) { return ConvertTcm(file); }},
+    {"sdr", [](std::string_view file) { return ConvertSdr(file, 1).book; }},
+    {"gre", [](std::string_view file) { return ConvertSdr(file, 7).book; }},
+    {"obs", [](std::string_view file) { return ConvertObs(file, 2).book; }},
+    {"set", [](std::string_view file) { return ConvertSet(file).book; }},
+    {"idx", [](std::string_view file) { return ConvertIdx(file).book; }},
+    {"tcm", [](std::string_view file) { return ConvertTcm(file).book; }},
 };
 
 TEST(InstrumentBadInput, AnyBytesGiveABoundedBookOfCrLfLines) {
@@ -51,9 +51,10 @@ TEST(InstrumentBadInput, AnyBytesGiveABoundedBookOfCrLfLines) {
     }
     EXPECT_LT(convert(big).size(), 4000u) << name;  // only the read columns reach the book
   }
-  // Records made of NUL bytes keep them as names, never as numbers.
-  const std::string book = ConvertSdr(nul, 1);
-  EXPECT_EQ(CountStarting(book, "TR "), 1);
+  // Records made of NUL bytes keep them as names, never as numbers: the
+  // set-up's control point and station record.
+  const std::string book = ConvertSdr(nul, 1).book;
+  EXPECT_EQ(CountStarting(book, "TR "), 2);
   EXPECT_EQ(CountStarting(book, "DKD "), 1);
 }
 

@@ -31,13 +31,6 @@ inline std::string TestData(const std::string& relative) {
 }
 inline std::string RealData(const std::string& name) { return DataFile(KAVU_REALDATA, name); }
 
-// The real recordings lie beside the repository (../shared/realdata); a clone
-// without them skips the tests that read them.
-#define KAVU_SKIP_WITHOUT_REALDATA()                                 \
-  if (!std::filesystem::is_directory(KAVU_REALDATA))                 \
-  GTEST_SKIP() << "the real recordings are not here: " KAVU_REALDATA \
-                  " (a clone without ../shared/realdata)"
-
 // Lines of a field book that begin with the given text.
 inline int CountStarting(std::string_view book, std::string_view prefix) {
   int count = 0;

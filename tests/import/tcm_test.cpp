@@ -25,29 +25,31 @@ std::string Obs(std::string_view number, std::string_view deg, std::string_view 
 
 // Checked by hand. The header line is skipped though it looks like a set-up;
 // ST0 followed by ST1 is dropped; number 0 at 0 00 00 orients ST1 and its
-// column shows the recorded "0"; a 2-character description is dropped; blank
-// zenith, distance and prism give "0", "0.0", "0.0"; 360 30 00 turns to
+// column shows the recorded "0"; a 2-character description is dropped; a
+// blank zenith stays blank (the run reports the record), blank distance and
+// prism give "0.0"; 360 30 00 turns to
 // 0 30 00; a blank height gives "0.0"; two number-0 lines in a row: the first
 // is skipped, the second (0 00 02) orients; a reading of 0 00 04 orients a
 // point numbered 5, and 0 00 06 after it turns to 2"; 10 00 00 after an
 // orientation at 350 00 00 becomes 20 00 00; TCVN3 bytes and an inner blank
 // of a description pass through; a set-up as the last record is written.
 TEST(ConvertTcm, GoldenEveryQuirk) {
-  EXPECT_EQ(ConvertTcm(TestData("tcm/quirks.tcm")), TestData("tcm/quirks.asc"));
+  EXPECT_EQ(ConvertTcm(TestData("tcm/quirks.tcm")).book, TestData("tcm/quirks.asc"));
 }
 
 TEST(ConvertTcm, LookAheadAtTheEnds) {
   // The last record has no successor: a number-0 observation there orients.
-  EXPECT_EQ(ConvertTcm("h\nST1         1.45\n" + Obs("0", "0", "0000", "DC02")),
+  EXPECT_EQ(ConvertTcm("h\nST1         1.45\n" + Obs("0", "0", "0000", "DC02")).book,
             "TR ST1 1.45\r\nDKD DC02\r\n0              0    10.000    900000    1.50 DC02\r\n");
   // Before any set-up the reference is 0; a number-0 line followed by another
   // is skipped.
-  EXPECT_EQ(ConvertTcm("h\n" + Obs("0", "1", "0000") + "\n" + Obs("0", "2", "0000")),
+  EXPECT_EQ(ConvertTcm("h\n" + Obs("0", "1", "0000") + "\n" + Obs("0", "2", "0000")).book,
             "DKD \r\n0          20000    10.000    900000    1.50 \r\n");
   // Every written set-up sets the reference back to 0 (3" here): 1 00 00
   // stays 1 00 00.
   EXPECT_EQ(
-      ConvertTcm("h\nA\n" + Obs("0", "0", "0003") + "\nB              1\n" + Obs("7", "1", "0000")),
+      ConvertTcm("h\nA\n" + Obs("0", "0", "0003") + "\nB              1\n" + Obs("7", "1", "0000"))
+          .book,
       "TR A 0.0\r\nDKD \r\n0          00003    10.000    900000    1.50 \r\n"
       "TR B 1\r\n7          10000    10.000    900000    1.50 \r\n");
 }
@@ -55,7 +57,7 @@ TEST(ConvertTcm, LookAheadAtTheEnds) {
 TEST(ConvertTcm, MoreThan4999RecordsAreAllWritten) {
   std::string file = "header\r\nST1         1.45\r\n" + Obs("0", "0", "0000", "K2");
   for (int k = 1; k <= 6000; ++k) file += "\r\n" + Obs(std::to_string(k), "10", "0000");
-  const std::vector<std::string> lines = SplitLines(ConvertTcm(file));
+  const std::vector<std::string> lines = SplitLines(ConvertTcm(file).book);
   ASSERT_EQ(lines.size(), 2u + 6001u);
   EXPECT_EQ(lines.back(), "6000      100000    10.000    900000    1.50 ");
 }
@@ -63,18 +65,19 @@ TEST(ConvertTcm, MoreThan4999RecordsAreAllWritten) {
 TEST(ConvertTcm, BadInputEndsWithABoundedFieldBook) {
   // Lines shorter than the columns read: a set-up without height, an
   // observation with nothing after its point number.
-  EXPECT_EQ(ConvertTcm("h\nS\n                         12"),
-            "TR S 0.0\r\nDKD \r\n12             0       0.0         0     0.0 \r\n");
+  EXPECT_EQ(ConvertTcm("h\nS\n                         12").book,
+            "TR S 0.0\r\nDKD \r\n12             0       0.0               0.0 \r\n");
   // Not numbers: readings without a value become "0" (and orient), the
   // distance and prism texts are copied.
   EXPECT_EQ(ConvertTcm("h\n" + std::string(25, ' ') + "     9 abc defg hij klmn" +
-                       std::string(9, ' ') + "    x.yz   abc"),
+                       std::string(9, ' ') + "    x.yz   abc")
+                .book,
             "DKD \r\n9              0      x.yz         0     abc \r\n");
   // A NUL inside a station name passes through.
   const std::string nul(1, '\0');
-  EXPECT_EQ(ConvertTcm("h\nS" + nul + "T          1.5\n"), "TR S" + nul + "T 1.5\r\n");
+  EXPECT_EQ(ConvertTcm("h\nS" + nul + "T          1.5\n").book, "TR S" + nul + "T 1.5\r\n");
   // A 10 MB line is one record read by its columns.
-  const std::string big = ConvertTcm("h\n" + std::string(10'000'000, 'x'));
+  const std::string big = ConvertTcm("h\n" + std::string(10'000'000, 'x')).book;
   EXPECT_EQ(big, "TR xxxxxxxxxx xxxxxx\r\n");
 }
 

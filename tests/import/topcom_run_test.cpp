@@ -1,6 +1,6 @@
-// The Topcom example jobs and the real keyword file through a whole run:
-// converted, computed, and a few coordinates checked against an azimuth and
-// distance worked out here from the control points.
+// The Topcom example jobs through a whole run: converted, computed, and a few
+// coordinates checked against an azimuth and distance worked out here from
+// the control points.
 #include <cmath>
 #include <string>
 
@@ -45,15 +45,6 @@ TEST_F(TopcomRun, Topcom226ExampleComputes) {
   ExpectNear(points, "205", Polar(kGps01, kGps04, 293 + 25 / 60.0 + 35 / 3600.0, 42.866));
   // 210 from GPS02 on GPS01: 6 37 17, 99.812.
   ExpectNear(points, "210", Polar(kGps02, kGps01, 6 + 37 / 60.0 + 17 / 3600.0, 99.812));
-}
-
-// Without its control points the real file cannot be computed; the run must
-// still end, report it, and leave the converted field book as converted.
-TEST_F(TopcomRun, RealKeywordFileRunsToTheEnd) {
-  KAVU_SKIP_WITHOUT_REALDATA();
-  EXPECT_EQ(Run({std::filesystem::path(KAVU_REALDATA) / "geoeasy-test.idx"}, {"--txt"}),
-            kExitDataErrors);
-  EXPECT_EQ(FileBytes(dir_ / "geoeasy-test.asc"), ConvertIdx(RealData("geoeasy-test.idx")));
 }
 
 }  // namespace
