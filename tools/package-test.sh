@@ -8,7 +8,7 @@ cd "$(dirname "$0")/.."
 
 . tools/ensure-packages.sh
 ensure_packages cmake ninja-build g++ libcli11-dev qt6-base-dev dpkg-dev file \
-  desktop-file-utils appstream
+  desktop-file-utils appstream shared-mime-info libglib2.0-bin
 
 export CMAKE_GENERATOR=Ninja
 rm -f build/package/kavu_*.deb
@@ -23,7 +23,7 @@ fail() {
   failed=1
 }
 
-dpkg-deb --info "$deb" | sed -n '/Package:/,$p'
+dpkg-deb -f "$deb" Package Version Maintainer Depends Description
 depends=$(dpkg-deb -f "$deb" Depends)
 for needed in libqt6widgets6 libstdc++6 qt6-qpa-plugins; do
   [[ $depends == *"$needed"* ]] || fail "Depends lacks $needed: $depends"
@@ -45,6 +45,32 @@ appstreamcli validate --no-net "$root/usr/share/metainfo/org.example.kavu.metain
 if [ -n "$(MANWIDTH=80 man --warnings -l "$root/usr/share/man/man1/kavu-cli.1.gz" 2>&1 >/dev/null)" ]; then
   fail "the manual page has warnings"
 fi
+
+# The file types, with the system's own: a field book is known by its first
+# record among the other *.asc files.
+mime=build/package-mime
+rm -rf "$mime"
+mkdir -p "$mime/mime/packages" "$mime/files"
+cp /usr/share/mime/packages/freedesktop.org.xml "$root/usr/share/mime/packages/kavu.xml" \
+  "$mime/mime/packages/"
+update-mime-database "$mime/mime" 2>/dev/null
+cp examples/job1.asc examples/instruments/job-{sdr.sdr,obs.obs,set.set,idx.idx,tcm.tcm} "$mime/files/"
+printf -- '-----BEGIN PGP SIGNATURE-----\n' >"$mime/files/signature.asc"
+printf 'a note\n' >"$mime/files/note.asc"
+while read -r file type; do
+  got=$(XDG_DATA_HOME="$PWD/$mime" XDG_DATA_DIRS="$PWD/$mime" \
+    gio info -a standard::content-type "$mime/files/$file" | sed -n 's/.*content-type: //p')
+  [ "$got" = "$type" ] || fail "$file is $got, not $type"
+done <<'TYPES'
+job1.asc application/x-kavu-fieldbook
+job-sdr.sdr application/x-kavu-sdr
+job-obs.obs application/x-kavu-obs
+job-set.set application/x-kavu-set
+job-idx.idx application/x-kavu-idx
+job-tcm.tcm application/x-kavu-tcm
+signature.asc application/pgp-signature
+note.asc text/plain
+TYPES
 
 # The packaged batch command on a copy of the example: every product, no
 # data error.
