@@ -17,5 +17,7 @@ set(CMAKE_FIND_ROOT_PATH_MODE_PACKAGE ONLY)
 # The program must run on a Windows machine without the compiler's DLLs.
 set(CMAKE_EXE_LINKER_FLAGS_INIT "-static -static-libgcc -static-libstdc++")
 
-# Windows test runs go through Wine.
-set(CMAKE_CROSSCOMPILING_EMULATOR wine)
+# Windows programs run under Wine, in a prefix of the build folder (its first
+# start is slow; it never touches the user's own ~/.wine).
+set(CMAKE_CROSSCOMPILING_EMULATOR env WINEPREFIX=${CMAKE_CURRENT_LIST_DIR}/../build/wine
+                                      WINEDEBUG=-all wine)

@@ -110,7 +110,7 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   }
   // The regenerated field book goes to TRIDO beside the file's folder.
   std::error_code ec;
-  fs::path folder = fs::absolute(file, ec).parent_path();
+  fs::path folder = fs::absolute(file, ec).make_preferred().parent_path();
   fs::path parent = folder.parent_path();
   if (parent.empty() || parent == folder) parent = folder;
   sel.tentmbd = WithSeparator(parent / "TRIDO");
