@@ -1,11 +1,11 @@
 #!/usr/bin/env bash
 # The Windows build under Wine: cross-builds kavu-cli.exe and the GoogleTest
 # suite with the windows-cli preset and runs the suite; then runs the batch
-# command on the example field book and on an example of every converter kind, each time with Windows paths (drive letters,
-# backslashes, forward slashes, a relative path, folders with Vietnamese
-# letters), and checks that it ends as the Linux build does and writes the
-# same products byte for byte; the converted field books must also equal the
-# converters' golden files.
+# command on the example field book and on an example of every converter
+# kind, each time with Windows paths (drive letters, backslashes, forward
+# slashes, a relative path, folders with Vietnamese letters), and checks that
+# it ends as the Linux build does and writes the same products byte for byte;
+# the converted field books must also equal the converters' golden files.
 #   tools/windows-test.sh [LINUX-KAVU-CLI]   (default build/debug/cli/kavu-cli)
 # Installs what is missing (Debian 12) with apt-get first.
 set -euo pipefail
@@ -146,6 +146,7 @@ run_case idx "$vn" z-backslash $ex/job-idx.idx --all --control-file @$ex/job-idx
 run_case tcm "$vn" k-drive $ex/job-tcm.tcm --all --control-file @$ex/job-idx-tcm-control.txt
 cp $ex/job-sdr.sdr "$work/job-gre.gre"
 run_case gre "$vn" relative "$work/job-gre.gre" --all
+shopt -s nullglob
 for input in tests/data/import/*/*.{sdr,obs,set,idx,tcm}; do
   kind=$(basename "$(dirname "$input")")
   run_case "golden-$kind" "$vn" k-drive "$input" --txt
