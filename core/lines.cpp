@@ -4,6 +4,8 @@
 #include <iterator>
 #include <system_error>
 
+#include "core/paths.h"
+
 namespace kavu {
 
 std::vector<std::string> SplitLines(std::string_view content) {
@@ -35,13 +37,25 @@ std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
   return bytes;
 }
 
+std::optional<std::string> ReadFileBytes(const std::string& utf8Path) {
+  return ReadFileBytes(PathFromUtf8(utf8Path));
+}
+
 std::optional<std::vector<std::string>> ReadLines(const std::filesystem::path& path) {
   auto bytes = ReadFileBytes(path);
   if (!bytes) return std::nullopt;
   return SplitLines(*bytes);
 }
 
+std::optional<std::vector<std::string>> ReadLines(const std::string& utf8Path) {
+  return ReadLines(PathFromUtf8(utf8Path));
+}
+
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
+
+TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
+
+bool TextOut::open(const std::string& utf8Path) { return open(PathFromUtf8(utf8Path)); }
 
 bool TextOut::open(const std::filesystem::path& path) {
   if (out_.is_open()) close();

@@ -6,6 +6,7 @@
 
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/paths.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -31,10 +32,10 @@ namespace {
 // Writes one product; a product that cannot be written is named for the
 // summary and the run goes on with the next.
 template <typename Body>
-void WriteProduct(RunState& st, const std::filesystem::path& path, Body body) {
+void WriteProduct(RunState& st, const std::string& path, Body body) {
   TextOut out(path);
   body(out);
-  if (!out.close()) st.unwritable.push_back(path.string());
+  if (!out.close()) st.unwritable.push_back(path);
 }
 
 int HeightDecimals(const std::string& text) {
@@ -50,7 +51,7 @@ void WriteTextProducts(RunState& st) {
   }
   if (Ticked(st.fasc)) {
     std::error_code ignored;
-    std::filesystem::create_directories(st.tentmbd, ignored);
+    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
     WriteProduct(st, st.filesl1, [&](TextOut& out) {
       out.Line(st.ChuoiKC);
       for (const std::string& line : st.MangSoLieuASC) out.Line(line);

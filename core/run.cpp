@@ -6,6 +6,7 @@
 
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/paths.h"
 #include "core/reports.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
@@ -224,7 +225,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
 }
 
 void CloseKeptFile(RunState& st, TextOut& file) {
-  if (file.is_open() && !file.close()) st.unwritable.push_back(file.path().string());
+  if (file.is_open() && !file.close()) st.unwritable.push_back(Utf8FromPath(file.path()));
 }
 
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
@@ -313,7 +314,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (st.err == 0) {
     std::error_code ignored;
     for (const char* extension : {".err", ".cpv", ".bak"}) {
-      std::filesystem::remove(st.daufile + extension, ignored);
+      std::filesystem::remove(PathFromUtf8(st.daufile + extension), ignored);
     }
   }
 
