@@ -23,6 +23,8 @@
 #include <cerrno>
 #endif
 
+#include "core/paths.h"
+
 namespace kavu {
 
 std::vector<std::string> SplitLines(std::string_view content) {
@@ -49,6 +51,8 @@ bool IsDataFile(const std::filesystem::path& path) {
   return std::filesystem::is_regular_file(path, ec);
 }
 
+bool IsDataFile(const std::string& utf8Path) { return IsDataFile(PathFromUtf8(utf8Path)); }
+
 std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
   if (!IsDataFile(path)) return std::nullopt;
   std::ifstream in(path, std::ios::binary);
@@ -58,10 +62,18 @@ std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
   return bytes;
 }
 
+std::optional<std::string> ReadFileBytes(const std::string& utf8Path) {
+  return ReadFileBytes(PathFromUtf8(utf8Path));
+}
+
 std::optional<std::vector<std::string>> ReadLines(const std::filesystem::path& path) {
   auto bytes = ReadFileBytes(path);
   if (!bytes) return std::nullopt;
   return SplitLines(*bytes);
+}
+
+std::optional<std::vector<std::string>> ReadLines(const std::string& utf8Path) {
+  return ReadLines(PathFromUtf8(utf8Path));
 }
 
 namespace {
@@ -85,6 +97,10 @@ bool WouldReplace(const std::filesystem::path& product, const std::filesystem::p
   return std::filesystem::equivalent(product, input, ec) && !ec;
 }
 
+bool WouldReplace(const std::string& utf8Product, const std::string& utf8Input) {
+  return WouldReplace(PathFromUtf8(utf8Product), PathFromUtf8(utf8Input));
+}
+
 std::filesystem::path TempPathOf(const std::filesystem::path& path) {
   std::filesystem::path temp = path;
   temp += kTempSuffix;
@@ -92,6 +108,10 @@ std::filesystem::path TempPathOf(const std::filesystem::path& path) {
 }
 
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
+
+TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
+
+bool TextOut::open(const std::string& utf8Path) { return open(PathFromUtf8(utf8Path)); }
 
 TextOut::TextOut(TextOut&& other) noexcept
     : file_(std::move(other.file_)), path_(std::move(other.path_)), failed_(other.failed_) {}

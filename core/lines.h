@@ -1,4 +1,5 @@
-// Reading and writing text files line by line. CR LF, a lone CR and a lone LF
+// Reading and writing text files line by line. A path given as a std::string
+// is UTF-8 text (see core/paths.h). CR LF, a lone CR and a lone LF
 // each end a line; a last line without a line end counts; there is no empty
 // line after the final line end. Lines are always written with CR LF.
 #pragma once
@@ -19,19 +20,23 @@ std::vector<std::string> SplitLines(std::string_view content);
 // A file that may be read: a regular file, or a link to one. Folders, FIFOs
 // and devices are not (a FIFO would block the run, a device never ends).
 bool IsDataFile(const std::filesystem::path& path);
+bool IsDataFile(const std::string& utf8Path);
 
 // The whole file as bytes, or nothing when it is no data file or cannot be
 // read.
 std::optional<std::string> ReadFileBytes(const std::filesystem::path& path);
+std::optional<std::string> ReadFileBytes(const std::string& utf8Path);
 
 // The file's lines, or nothing when it cannot be read.
 std::optional<std::vector<std::string>> ReadLines(const std::filesystem::path& path);
+std::optional<std::vector<std::string>> ReadLines(const std::string& utf8Path);
 
 // True when writing `product` would replace the file `input` that a run reads:
 // the same path (./ and .. included) or the same file under another name (a
 // hard link, or a symbolic link to it, given as the input). A product that is
 // itself a symbolic link is never the same: writing replaces the link only.
 bool WouldReplace(const std::filesystem::path& product, const std::filesystem::path& input);
+bool WouldReplace(const std::string& utf8Product, const std::string& utf8Input);
 
 // The suffix of the temporary file beside a product while it is written.
 inline constexpr std::string_view kTempSuffix = ".kavu-tmp";
@@ -48,11 +53,13 @@ class TextOut {
  public:
   TextOut() = default;
   explicit TextOut(const std::filesystem::path& path);
+  explicit TextOut(const std::string& utf8Path);
   TextOut(TextOut&& other) noexcept;
   TextOut& operator=(TextOut&& other) noexcept;
   ~TextOut();
 
   bool open(const std::filesystem::path& path);
+  bool open(const std::string& utf8Path);
   bool is_open() const { return file_ != nullptr; }
   bool ok() const;
   void Line(std::string_view text);   // text + CR LF

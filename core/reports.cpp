@@ -6,6 +6,7 @@
 
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/paths.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -62,7 +63,7 @@ void WriteTextProducts(RunState& st) {
   }
   if (Ticked(st.fasc)) {
     std::error_code ignored;
-    std::filesystem::create_directories(st.tentmbd, ignored);
+    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
     WriteProduct(st, st.filesl1, [&](TextOut& out) {
       out.Line(st.ChuoiKC);
       for (const std::string& line : st.MangSoLieuASC) out.Line(line);

@@ -7,6 +7,7 @@
 
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/paths.h"
 #include "core/reports.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
@@ -225,7 +226,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
 }
 
 void CommitKeptFile(RunState& st, TextOut& file) {
-  if (file.is_open() && !file.commit()) st.unwritable.push_back(file.path().string());
+  if (file.is_open() && !file.commit()) st.unwritable.push_back(Utf8FromPath(file.path()));
 }
 
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
@@ -244,7 +245,7 @@ void RemoveProduct(const RunState& st, const std::string& path) {
     if (WouldReplace(path, input)) return;
   }
   std::error_code ignored;
-  std::filesystem::remove(path, ignored);
+  std::filesystem::remove(PathFromUtf8(path), ignored);
 }
 
 // A station record that the station loop can reach: on any line but the last.

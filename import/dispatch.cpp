@@ -5,6 +5,7 @@
 #include <system_error>
 
 #include "core/messages.h"
+#include "core/paths.h"
 #include "core/text.h"
 #include "import/converters.h"
 
@@ -35,7 +36,7 @@ constexpr std::array<Kind, 10> kKinds{{
 constexpr std::array<std::size_t, 7> kHeaderWidths{39, 6, 19, 20, 17, 18, 10};
 
 std::string WithSeparator(const fs::path& folder) {
-  std::string text = folder.string();
+  std::string text = Utf8FromPath(folder);
   if (text.empty() || text.back() != fs::path::preferred_separator) {
     text += static_cast<char>(fs::path::preferred_separator);
   }
@@ -57,7 +58,7 @@ std::string NotFoundMessage(const std::string& path) {
 // run, a device never ends). Refused otherwise, with txtfile emptied.
 bool ReadableFile(RunState& st, Host& host, const std::string& path) {
   std::error_code ec;
-  if (!fs::exists(path, ec)) {
+  if (!fs::exists(PathFromUtf8(path), ec)) {
     RefuseFile(st, host, NotFoundMessage(path));
     return false;
   }
@@ -76,11 +77,11 @@ void RemoveLeftovers(const RunState& st) {
     products.push_back(st.daufile + extension);
   }
   for (const std::string& product : products) {
-    const fs::path temp = TempPathOf(product);
+    const std::string temp = product + std::string(kTempSuffix);
     bool read = false;
     for (const std::string& input : st.inputs) read = read || WouldReplace(temp, input);
     std::error_code ec;
-    if (!read) fs::remove(temp, ec);
+    if (!read) fs::remove(PathFromUtf8(temp), ec);
   }
 }
 
@@ -121,8 +122,8 @@ std::string_view PatternOfKind(int kind) {
 
 void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   sel.filesl = std::string(path);
-  const fs::path file(sel.filesl);
-  const std::string name = file.filename().string();
+  const fs::path file = PathFromUtf8(sel.filesl);
+  const std::string name = Utf8FromPath(file.filename());
   const std::string folderText = sel.filesl.substr(0, sel.filesl.size() - name.size());
   sel.tentm = folderText;
   // Only the dots of the file name count: a dot in a folder name must not
@@ -140,7 +141,7 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   }
   // The regenerated field book goes to TRIDO beside the file's folder.
   std::error_code ec;
-  fs::path folder = fs::absolute(file, ec).parent_path();
+  fs::path folder = fs::absolute(file, ec).make_preferred().parent_path();
   fs::path parent = folder.parent_path();
   if (parent.empty() || parent == folder) parent = folder;
   sel.tentmbd = WithSeparator(parent / "TRIDO");
@@ -169,7 +170,7 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
     }
   }
   std::error_code ec;
-  if (fs::file_size(st.filesl, ec) == 0 && !ec) {
+  if (fs::file_size(PathFromUtf8(st.filesl), ec) == 0 && !ec) {
     RefuseFile(st, host,
                std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
     return std::nullopt;

@@ -4,6 +4,7 @@
 #include <system_error>
 
 #include "core/messages.h"
+#include "core/paths.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
@@ -47,7 +48,7 @@ bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& f
     }
     // Only a data file is read: a FIFO would block the run, a device never ends.
     std::error_code ec;
-    if (std::filesystem::exists(path, ec) && !IsDataFile(path)) {
+    if (std::filesystem::exists(PathFromUtf8(path), ec) && !IsDataFile(path)) {
       host.MessageBox(std::string(msg::kNotDataFile) + path, MsgIcon::Critical, MsgButtons::Ok);
       return false;
     }

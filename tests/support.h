@@ -18,6 +18,12 @@ inline std::filesystem::path FreshFolder(const std::string& area = "kavu") {
   const auto* info = ::testing::UnitTest::GetInstance()->current_test_info();
   const std::filesystem::path folder = std::filesystem::path(::testing::TempDir()) / area /
                                        (std::string(info->test_suite_name()) + "." + info->name());
+  // Windows refuses to delete a read-only file (a copied data file may be one).
+  std::error_code ec;
+  for (const auto& entry : std::filesystem::recursive_directory_iterator(folder, ec)) {
+    std::filesystem::permissions(entry.path(), std::filesystem::perms::owner_write,
+                                 std::filesystem::perm_options::add, ec);
+  }
   std::filesystem::remove_all(folder);
   std::filesystem::create_directories(folder);
   return folder;

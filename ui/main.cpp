@@ -1,5 +1,9 @@
-// The desktop program. Besides the ordinary start it can compute one file on
-// its own and save pictures of the window (for the smoke test and the manual):
+// The desktop program. Started with a file (from the desktop entry or a file
+// manager), it chooses that file as a click in the file list does and computes
+// nothing until asked:
+//   kavu [FILE]
+// Besides the ordinary start it can compute one file on its own and save
+// pictures of the window (for the smoke test and the manual):
 //   kavu --compute FILE [--screenshot PICTURE.png]
 // answers every question with its default, saves the main window after the
 // run (and the summary box, the editor on the field book and the find window
@@ -16,6 +20,7 @@
 #include "ui/ask.h"
 #include "ui/editor.h"
 #include "ui/mainwindow.h"
+#include "ui/openfile.h"
 #include "ui/texts.h"
 #include "ui/timthay.h"
 
@@ -79,10 +84,15 @@ int main(int argc, char** argv) {
                                       QStringLiteral("PICTURE"));
   parser.addOption(compute);
   parser.addOption(screenshot);
+  parser.addPositionalArgument(QStringLiteral("FILE"),
+                               QStringLiteral("The data file to choose (nothing is computed)."),
+                               QStringLiteral("[FILE]"));
   parser.process(app);
 
   kavu::ui::MainWindow window;
   window.show();
+  if (!parser.positionalArguments().isEmpty())
+    kavu::ui::ChooseFile(window, parser.positionalArguments().front());
   if (!parser.isSet(compute)) {
     if (parser.isSet(screenshot)) {
       QTimer::singleShot(200, &window, [&window, &parser, &screenshot] {

@@ -87,6 +87,16 @@ std::string Std(const QString& text) { return text.toStdString(); }
 constexpr const char* kDefaultFolder = "c:\\";
 #endif
 
+// The help file: beside the program in the build folder, in share/kavu/ once
+// installed. When neither exists the message names the one beside the program.
+QString HelpFilePath() {
+  const QString folder = QCoreApplication::applicationDirPath();
+  const QString beside = QDir::toNativeSeparators(folder + QStringLiteral("/kavu.hlp"));
+  const QString installed = QDir::toNativeSeparators(
+      QDir::cleanPath(folder + QStringLiteral("/" KAVU_INSTALLED_HELP_DIR "/kavu.hlp")));
+  return !QFileInfo(beside).isFile() && QFileInfo(installed).isFile() ? installed : beside;
+}
+
 }  // namespace
 
 int BoxState(const QCheckBox* box) {
@@ -417,8 +427,7 @@ void MainWindow::suasolieu_Click() {
 }
 
 void MainWindow::trogiup_Click() {
-  const QString path = QDir::toNativeSeparators(QCoreApplication::applicationDirPath() +
-                                                QStringLiteral("/kavu.hlp"));
+  const QString path = HelpFilePath();
   QFile file(path);
   if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly)) {
     tbao_ = ask_(Q(kFileNotFoundShort) + path, MsgIcon::Critical, MsgButtons::Ok);

@@ -7,6 +7,7 @@
 
 #include "core/angles.h"
 #include "core/lines.h"
+#include "core/paths.h"
 #include "tests/support.h"
 
 namespace kavu {
@@ -118,6 +119,24 @@ TEST(Lines, TextOutWritesCrLfAndReportsFailure) {
   EXPECT_FALSE(bad.ok());
   bad.Line("swallowed");
   EXPECT_FALSE(bad.close());
+}
+
+// Paths are UTF-8 text: a folder and a file with Vietnamese letters are
+// written, read and listed under the same names.
+TEST(Lines, Utf8PathsRoundTrip) {
+  const std::string dir = Utf8FromPath(std::filesystem::temp_directory_path()) + "/kavu_Khảo sát";
+  const std::string file = dir + "/Đồng Tâm.asc";
+  std::filesystem::create_directories(PathFromUtf8(dir));
+  TextOut out(file);
+  out.Line("TR");
+  EXPECT_TRUE(out.close());
+  EXPECT_EQ(ReadFileBytes(file), std::optional<std::string>("TR\r\n"));
+  std::vector<std::string> names;
+  for (const auto& entry : std::filesystem::directory_iterator(PathFromUtf8(dir))) {
+    names.push_back(Utf8FromPath(entry.path().filename()));
+  }
+  EXPECT_EQ(names, std::vector<std::string>{"Đồng Tâm.asc"});
+  std::filesystem::remove_all(PathFromUtf8(dir));
 }
 
 }  // namespace

@@ -11,31 +11,57 @@ namespace {
 
 namespace fs = std::filesystem;
 
+// The names of a path, native on each system: on Windows with drive letters
+// and backslashes (the system's absolute path gives the TRIDO folder).
 TEST(DeriveFileSelection, ProductsAreNamedAfterTheFileNameOnly) {
-  FileSelection sel;
-  DeriveFileSelection(sel, "/data/survey/job1.sdr");
-  EXPECT_EQ(sel.filesl, "/data/survey/job1.sdr");
-  EXPECT_EQ(sel.tentm, "/data/survey/");
-  EXPECT_EQ(sel.daufile, "/data/survey/job1");
-  EXPECT_EQ(sel.duoifile, "sdr");
-  EXPECT_EQ(sel.tentmbd, "/data/TRIDO/");
-  EXPECT_EQ(sel.filesl1, "/data/TRIDO/job1.asc");
-
-  // A dot in a folder name no longer renames the products.
-  DeriveFileSelection(sel, "/data/My.Data/Job1.v2.ASC");
-  EXPECT_EQ(sel.daufile, "/data/My.Data/Job1");
-  EXPECT_EQ(sel.duoifile, "v2");
-  EXPECT_EQ(sel.filesl1, "/data/TRIDO/Job1.asc");
-
-  // No dot at all: kind 9 and the whole path as the base.
-  DeriveFileSelection(sel, "/data/survey/README");
-  EXPECT_EQ(sel.daufile, "/data/survey/README");
-  EXPECT_EQ(sel.duoifile, "");
-  EXPECT_EQ(KindOfExtension(sel.duoifile), 9);
-
-  // At the root the folder has no parent: TRIDO goes into it.
-  DeriveFileSelection(sel, "/job1.asc");
-  EXPECT_EQ(sel.tentmbd, "/TRIDO/");
+  struct Case {
+    const char* path;
+    const char* tentm;
+    const char* daufile;
+    const char* duoifile;
+    const char* tentmbd;
+    const char* filesl1;
+  };
+  const Case cases[] = {
+#ifdef _WIN32
+      {"C:\\DATA\\JOB1.SDR", "C:\\DATA\\", "C:\\DATA\\JOB1", "SDR", "C:\\TRIDO\\",
+       "C:\\TRIDO\\JOB1.asc"},
+      // A dot in a folder name does not rename the products.
+      {"D:\\Đo vẽ\\My.Data\\Job1.v2.ASC", "D:\\Đo vẽ\\My.Data\\", "D:\\Đo vẽ\\My.Data\\Job1", "v2",
+       "D:\\Đo vẽ\\TRIDO\\", "D:\\Đo vẽ\\TRIDO\\Job1.asc"},
+      // No dot at all: the whole path as the base.
+      {"C:\\data\\README", "C:\\data\\", "C:\\data\\README", "", "C:\\TRIDO\\",
+       "C:\\TRIDO\\README.asc"},
+      // Forward slashes are separators too.
+      {"C:/data/survey/job1.sdr", "C:/data/survey/", "C:/data/survey/job1", "sdr",
+       "C:\\data\\TRIDO\\", "C:\\data\\TRIDO\\job1.asc"},
+      // At the drive root the folder has no parent: TRIDO goes into it.
+      {"C:\\job1.asc", "C:\\", "C:\\job1", "asc", "C:\\TRIDO\\", "C:\\TRIDO\\job1.asc"},
+#else
+      {"/data/survey/job1.sdr", "/data/survey/", "/data/survey/job1", "sdr", "/data/TRIDO/",
+       "/data/TRIDO/job1.asc"},
+      // A dot in a folder name does not rename the products.
+      {"/data/My.Data/Job1.v2.ASC", "/data/My.Data/", "/data/My.Data/Job1", "v2", "/data/TRIDO/",
+       "/data/TRIDO/Job1.asc"},
+      // No dot at all: the whole path as the base.
+      {"/data/survey/README", "/data/survey/", "/data/survey/README", "", "/data/TRIDO/",
+       "/data/TRIDO/README.asc"},
+      // At the root the folder has no parent: TRIDO goes into it.
+      {"/job1.asc", "/", "/job1", "asc", "/TRIDO/", "/TRIDO/job1.asc"},
+#endif
+  };
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.path);
+    FileSelection sel;
+    DeriveFileSelection(sel, c.path);
+    EXPECT_EQ(sel.filesl, c.path);
+    EXPECT_EQ(sel.tentm, c.tentm);
+    EXPECT_EQ(sel.daufile, c.daufile);
+    EXPECT_EQ(sel.duoifile, c.duoifile);
+    EXPECT_EQ(sel.tentmbd, c.tentmbd);
+    EXPECT_EQ(sel.filesl1, c.filesl1);
+  }
+  EXPECT_EQ(KindOfExtension(""), 9);
 }
 
 TEST(KindOfExtension, UpperCaseExtensionsSelectTheirKindAndPattern) {

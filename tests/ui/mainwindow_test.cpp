@@ -16,6 +16,7 @@
 #include "ui/editor.h"
 #include "ui/lists.h"
 #include "ui/nhapsdo.h"
+#include "ui/openfile.h"
 
 using namespace kavu;
 using namespace kavu::ui;
@@ -81,6 +82,35 @@ class MainWindowTest : public QObject {
     QTest::keyClick(kinds, Qt::Key_Down);
     QCOMPARE(files->pattern(), QStringLiteral("*.*"));
     QCOMPARE(files->count(), 3);
+  }
+
+  // The file given on the command line is chosen as a click would choose it,
+  // in a folder with Vietnamese letters, and nothing is computed.
+  void theFileOfTheCommandLineIsChosenNotComputed() {
+    Desk desk;
+    const QString folder = Native(desk.work.path() + QStringLiteral("/Khảo sát"));
+    QVERIFY(QDir().mkpath(folder));
+    const QString sdr = folder + Sep() + QStringLiteral("job1.sdr");
+    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/instruments/job-sdr.sdr"), sdr));
+    desk.w.show();
+    ChooseFile(desk.w, sdr);
+
+    const RunState& st = desk.w.state();
+    QCOMPARE(Q(st.filesl), sdr);
+    QCOMPARE(Q(st.daufile), folder + Sep() + QStringLiteral("job1"));
+    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), sdr);
+    QCOMPARE(Child<QComboBox>(desk.w, "cbkieu")->currentIndex(), 1);
+    auto* files = Child<FileList>(desk.w, "lstfile");
+    QCOMPARE(Native(files->path()), folder);
+    QCOMPARE(files->currentItem()->text(), QStringLiteral("job1.sdr"));
+    QVERIFY(desk.person.asked.empty());
+    QCOMPARE(QDir(folder).entryList(QDir::Files), QStringList{QStringLiteral("job1.sdr")});
+
+    // A file that does not exist only fills the file box.
+    const QString missing = folder + Sep() + QStringLiteral("none.asc");
+    ChooseFile(desk.w, missing);
+    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), missing);
+    QVERIFY(desk.person.asked.empty());
   }
 
   void aComputeEndsWithTheSummary() {
