@@ -14,6 +14,8 @@
 #endif
 #include <io.h>
 #include <windows.h>
+// windows.h names a drawing call TextOut; ours is the text file.
+#undef TextOut
 #else
 #include <fcntl.h>
 #include <sys/file.h>

@@ -198,7 +198,7 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
 
   // One run of a job at a time; what a killed run left is removed.
   if (jobLock != nullptr) {
-    switch (jobLock->Acquire(st.daufile + ".lock")) {
+    switch (jobLock->Acquire(PathFromUtf8(st.daufile + ".lock"))) {
       case FileLock::Result::Busy:
         host.MessageBox(std::string(msg::kBeingComputed) + st.filesl, MsgIcon::Critical,
                         MsgButtons::Ok);
