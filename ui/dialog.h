@@ -3,6 +3,8 @@
 #pragma once
 
 #include <QDialog>
+#include <QString>
+#include <QStringList>
 
 class QPushButton;
 
@@ -23,6 +25,12 @@ class Window : public QDialog {
  private:
   QPushButton* cancel_ = nullptr;
 };
+
+// The open-file dialog with Vietnamese labels, in detail view and wide enough
+// for its columns: starts in folder with the first filter; the chosen path,
+// or the empty text when cancelled.
+QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
+                   const QStringList& filters);
 
 // A push button with its object name and caption.
 QPushButton* MakeButton(QWidget* parent, const char* name, const QString& caption);
