@@ -2,8 +2,11 @@
 
 #include <QCloseEvent>
 #include <QFileDialog>
+#include <QHeaderView>
+#include <QIdentityProxyModel>
 #include <QKeyEvent>
 #include <QPushButton>
+#include <QTreeView>
 
 #include "ui/ask.h"
 #include "ui/texts.h"
@@ -28,9 +31,24 @@ void Window::reject() { close(); }
 
 void Window::closeEvent(QCloseEvent* event) { event->accept(); }
 
-QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
-                   const QStringList& filters) {
-  QFileDialog dialog(parent, caption, folder);
+namespace {
+
+// The file list's column headings in Vietnamese.
+class VietnameseHeadings : public QIdentityProxyModel {
+ public:
+  using QIdentityProxyModel::QIdentityProxyModel;
+  QVariant headerData(int section, Qt::Orientation orientation, int role) const override {
+    if (orientation == Qt::Horizontal && role == Qt::DisplayRole && section >= 0 &&
+        section < static_cast<int>(kFileColumns.size())) {
+      return Q(kFileColumns[static_cast<std::size_t>(section)]);
+    }
+    return QIdentityProxyModel::headerData(section, orientation, role);
+  }
+};
+
+}  // namespace
+
+void SetUpFileDialog(QFileDialog& dialog, const QStringList& filters) {
   // Qt's own dialog, whose labels the program can set.
   dialog.setOption(QFileDialog::DontUseNativeDialog);
   dialog.setFileMode(QFileDialog::ExistingFile);
@@ -41,7 +59,20 @@ QString ChooseFile(QWidget* parent, const QString& caption, const QString& folde
   dialog.setLabelText(QFileDialog::FileType, Q(kFileType));
   dialog.setLabelText(QFileDialog::Accept, Q(kOpen));
   dialog.setLabelText(QFileDialog::Reject, Q(kCancel));
+  dialog.setProxyModel(new VietnameseHeadings(&dialog));
+  // The name takes the room left; the size, kind and date are shown whole.
+  if (auto* list = dialog.findChild<QTreeView*>()) {
+    list->header()->setStretchLastSection(false);
+    list->header()->setSectionResizeMode(QHeaderView::ResizeToContents);
+    list->header()->setSectionResizeMode(0, QHeaderView::Stretch);
+  }
   dialog.resize(760, 460);
+}
+
+QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
+                   const QStringList& filters) {
+  QFileDialog dialog(parent, caption, folder);
+  SetUpFileDialog(dialog, filters);
   if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) return {};
   return dialog.selectedFiles().first();
 }

@@ -6,6 +6,7 @@
 #include <QString>
 #include <QStringList>
 
+class QFileDialog;
 class QPushButton;
 
 namespace kavu::ui {
@@ -27,8 +28,9 @@ class Window : public QDialog {
 };
 
 // The open-file dialog with Vietnamese labels, in detail view and wide enough
-// for its columns: starts in folder with the first filter; the chosen path,
-// or the empty text when cancelled.
+// for its columns, starting in folder with the first filter.
+void SetUpFileDialog(QFileDialog& dialog, const QStringList& filters);
+// That dialog shown: the chosen path, or the empty text when cancelled.
 QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
                    const QStringList& filters);
 

@@ -23,6 +23,7 @@ inline constexpr std::string_view kFileType = "Kiểu File:";
 inline constexpr std::string_view kAllFiles = "Mọi File (*)";
 inline constexpr std::string_view kErrFiles = "File báo lỗi (*.err)";
 inline constexpr std::string_view kOpenFolder = "Mở thư mục";
+inline constexpr std::array<std::string_view, 4> kFileColumns = {"Tên", "Cỡ", "Kiểu", "Ngày sửa"};
 
 // Main window.
 inline constexpr std::string_view kMainCaption = "Xử lý số liệu đo toạ độ, độ cao chi tiết";
