@@ -310,7 +310,7 @@ Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
   setWindowTitle(Q(kViewerCaption));
   // No cancel button: Esc must not close the viewer by accident.
   thoat_ = MakeButton(this, "thoat", Q(kExit));
-  setMinimumSize(Px(3800) + 2 * Px(300), Px(2400));
+  setMinimumSize(Px(3800 + 200), Px(2400));
   Place(this, false, thoat_->sizeHint().height());
   text_->viewport()->installEventFilter(this);
   connect(save_, &QPushButton::clicked, this, &Xem::ghixem_Click);
@@ -363,7 +363,7 @@ Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
     return chosen.isEmpty() ? proposed : chosen;
   };
   // The four buttons side by side, with a margin.
-  setMinimumSize(Px(4300) + 2 * Px(300), Px(2400));
+  setMinimumSize(Px(4300 + 200), Px(2400));
   Place(this, true, thoat_->sizeHint().height());
   viewer_.setPointOpener([this](const QString& report, const QString& point) {
     // The report "name.err" belongs to the field book "name.asc".

@@ -7,6 +7,7 @@
 #include <QDir>
 #include <QLineEdit>
 #include <QPushButton>
+#include <QScreen>
 #include <QTextBrowser>
 #include <QtTest>
 #include <functional>
@@ -17,6 +18,7 @@
 #include "ui/editor.h"
 #include "ui/lists.h"
 #include "ui/nhapsdo.h"
+#include "ui/timthay.h"
 
 using namespace kavu;
 using namespace kavu::ui;
@@ -258,6 +260,21 @@ class MainWindowTest : public QObject {
     Window* help = desk.w.helpWindow();
     QVERIFY(help != nullptr && help->isVisible());
     QVERIFY(help->findChild<QTextBrowser*>()->toPlainText().contains(QStringLiteral("Inputs")));
+  }
+
+  void sideWindowsAreWindowsOfTheirOwn() {
+    // Not tied to the main window, so none of them always covers another;
+    // the editor on the right two fifths, the viewer on the left three.
+    MainWindow w;
+    for (QWidget* side :
+         std::initializer_list<QWidget*>{&w.editor(), &w.viewer(), &w.finder(), &w.headerForm()}) {
+      QVERIFY(side->isWindow());
+      QVERIFY(side->parentWidget() == nullptr);
+    }
+    const QRect area = QGuiApplication::primaryScreen()->availableGeometry();
+    QCOMPARE(w.editor().x(), area.left() + area.width() / 5 * 3);
+    QCOMPARE(w.viewer().x(), area.left());
+    QCOMPARE(w.viewer().width(), area.width() / 5 * 3);
   }
 
   void controlFileChoice() {
