@@ -135,8 +135,9 @@ int main(int argc, char** argv) {
 
   std::printf("field book %lld MB, %lld matches; milliseconds on the wall (processor)\n",
               static_cast<long long>(megabytes), static_cast<long long>(matches));
-  std::printf("open in the editor      %7.0f (%5.0f), of which reading %.0f, decoding %.0f\n",
-              open.wall, open.cpu, read.wall, decode.wall);
+  std::printf(
+      "open in the editor      %7.0f (%5.0f), of which reading %.0f (%.0f), decoding %.0f (%.0f)\n",
+      open.wall, open.cpu, read.wall, read.cpu, decode.wall, decode.cpu);
   std::printf("find next, no match     %7.0f (%5.0f)\n", miss.wall, miss.cpu);
   std::printf("replace all             %7.0f (%5.0f), %lld replaced\n", all.wall, all.cpu,
               static_cast<long long>(left));
