@@ -2,6 +2,7 @@
 // byte for byte with their backups, and the saves that cannot be made.
 #include "ui/editor.h"
 
+#include <QDesktopServices>
 #include <QDir>
 #include <QFileDialog>
 #include <QLineEdit>
@@ -60,6 +61,10 @@ class EditorTest : public QObject {
   Q_OBJECT
 
   QTemporaryDir store_;
+  QUrl opened_;
+
+ public slots:
+  void opened(const QUrl& url) { opened_ = url; }
 
  private slots:
   void init() { UseScratchSettings(store_); }
