@@ -1,12 +1,15 @@
 #include "ui/dialog.h"
 
 #include <QCloseEvent>
+#include <QCoreApplication>
 #include <QFileDialog>
 #include <QHeaderView>
 #include <QIdentityProxyModel>
 #include <QKeyEvent>
 #include <QPushButton>
+#include <QTranslator>
 #include <QTreeView>
+#include <memory>
 
 #include "ui/ask.h"
 #include "ui/texts.h"
@@ -75,6 +78,15 @@ QString ChooseFile(QWidget* parent, const QString& caption, const QString& folde
   SetUpFileDialog(dialog, filters);
   if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) return {};
   return dialog.selectedFiles().first();
+}
+
+bool InstallTranslation(const QString& folder) {
+  QCoreApplication* app = QCoreApplication::instance();
+  auto translator = std::make_unique<QTranslator>(app);
+  if (app == nullptr || !translator->load(QStringLiteral("kavu_vi"), folder)) return false;
+  // The application owns it from here and keeps it as long as it runs.
+  QCoreApplication::installTranslator(translator.release());
+  return true;
 }
 
 QPushButton* MakeButton(QWidget* parent, const char* name, const QString& caption) {

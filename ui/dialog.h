@@ -34,6 +34,10 @@ void SetUpFileDialog(QFileDialog& dialog, const QStringList& filters);
 QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
                    const QStringList& filters);
 
+// Qt's own texts in Vietnamese from the translation "kavu_vi.qm" in folder;
+// false when it is not there.
+bool InstallTranslation(const QString& folder);
+
 // A push button with its object name and caption.
 QPushButton* MakeButton(QWidget* parent, const char* name, const QString& caption);
 

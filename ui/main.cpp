@@ -14,6 +14,7 @@
 #include <cstdio>
 
 #include "ui/ask.h"
+#include "ui/dialog.h"
 #include "ui/editor.h"
 #include "ui/mainwindow.h"
 #include "ui/texts.h"
@@ -70,6 +71,7 @@ int ComputeAlone(kavu::ui::MainWindow& window, const QString& file, const QStrin
 int main(int argc, char** argv) {
   QApplication app(argc, argv);
   QApplication::setApplicationName(Q(kavu::ui::kAppTitle));
+  kavu::ui::InstallTranslation(QCoreApplication::applicationDirPath());
   QCommandLineParser parser;
   parser.addHelpOption();
   const QCommandLineOption compute(QStringLiteral("compute"),

@@ -6,12 +6,14 @@
 #include <QDir>
 #include <QFileDialog>
 #include <QLineEdit>
+#include <QMenu>
 #include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QTextBlock>
 #include <QtTest>
 #include <functional>
+#include <memory>
 
 #include "core/messages.h"
 #include "support.h"
@@ -306,6 +308,17 @@ class EditorTest : public QObject {
   }
 
   void theStandardDialogsSpeakVietnamese() {
+    // Qt's own texts through the project's translation, when it was built.
+    if (QFile::exists(QStringLiteral(KAVU_TRANSLATION "/kavu_vi.qm"))) {
+      QVERIFY(InstallTranslation(QStringLiteral(KAVU_TRANSLATION)));
+      QLineEdit edit;
+      const std::unique_ptr<QMenu> menu(edit.createStandardContextMenu());
+      QStringList items;
+      for (const QAction* action : menu->actions())
+        items.append(action->text().section('\t', 0, 0));
+      QVERIFY(items.contains(Q("&Dán")));
+      QVERIFY(items.contains(Q("Chọn tất cả")));
+    }
     QMessageBox box;
     SetUpMessageBox(box, Question{Q(kSaveChanges) + QStringLiteral("/data/job1.asc?"),
                                   MsgIcon::Question,
