@@ -25,7 +25,6 @@
 #include <unistd.h>
 #endif
 
-#include "core/lines.h"
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "ui/ask.h"
@@ -97,6 +96,14 @@ QString DecodeForScreen(const QByteArray& bytes) {
   }
   text.truncate(n);
   return text;
+}
+
+std::optional<QString> ReadScreenText(const QString& path) {
+  QFile file(path);
+  if (!file.open(QIODevice::ReadOnly)) return std::nullopt;
+  const QByteArray bytes = file.readAll();
+  if (file.error() != QFileDevice::NoError) return std::nullopt;
+  return DecodeForScreen(bytes);
 }
 
 QByteArray EncodeForFile(const QString& text) {
@@ -388,12 +395,11 @@ bool Suasl::openFile(const QString& filesl, const QString& daufile, const QStrin
 
 bool Suasl::showPoint(const QString& book, const QString& point) {
   if (QFileInfo(book) != QFileInfo(file()) || !isVisible()) {
-    const std::optional<std::string> bytes = ReadFileBytes(book.toStdU16String());
-    if (!bytes) return false;
+    const std::optional<QString> text = ReadScreenText(book);
     // The backup base is the path before its first ".", as for the main
     // window's file.
-    if (!openFile(book, book.section(QLatin1Char('.'), 0, 0), QFileInfo(book).path(),
-                  DecodeForScreen(QByteArray(bytes->data(), qsizetype(bytes->size()))))) {
+    if (!text ||
+        !openFile(book, book.section(QLatin1Char('.'), 0, 0), QFileInfo(book).path(), *text)) {
       return false;
     }
   }
@@ -412,12 +418,12 @@ void Suasl::xemfile_Click() {
   const QString proposed = Q(kErrPattern);
   const QString chosen = chooser_ ? chooser_(tentm_, proposed) : QString();
   if (chosen.isEmpty() || chosen == proposed) return;
-  const std::optional<std::string> bytes = ReadFileBytes(chosen.toStdU16String());
-  if (!bytes) {
+  const std::optional<QString> text = ReadScreenText(chosen);
+  if (!text) {
     ask_(Q(msg::kCannotOpen) + QDir::toNativeSeparators(chosen), MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  viewer_.showFile(chosen, DecodeForScreen(QByteArray(bytes->data(), qsizetype(bytes->size()))));
+  viewer_.showFile(chosen, *text);
 }
 
 void Suasl::resizeEvent(QResizeEvent* event) {

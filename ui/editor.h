@@ -6,6 +6,7 @@
 #include <QPlainTextEdit>
 #include <QString>
 #include <functional>
+#include <optional>
 #include <string_view>
 
 #include "ui/dialog.h"
@@ -19,6 +20,8 @@ class Timthay;
 
 // A file's TCVN3 bytes as screen text (every line end becomes LF).
 QString DecodeForScreen(const QByteArray& bytes);
+// A whole file as screen text; nothing when it cannot be read.
+std::optional<QString> ReadScreenText(const QString& path);
 // Screen text as the file's TCVN3 bytes with CR LF line ends; a final line
 // break is added only when the text does not end with one.
 QByteArray EncodeForFile(const QString& text);

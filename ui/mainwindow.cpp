@@ -23,7 +23,6 @@
 #include <QUrl>
 #include <QVBoxLayout>
 
-#include "core/lines.h"
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "import/dispatch.h"
@@ -507,13 +506,12 @@ void MainWindow::suasolieu_Click() {
     tbao_ = ask_(Q(kFileNotFoundShort) + filesl, MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  const std::optional<std::string> bytes = ReadFileBytes(st_.filesl);
-  if (!bytes) {
+  const std::optional<QString> text = ReadScreenText(filesl);
+  if (!text) {
     tbao_ = ask_(Q(msg::kCannotOpen) + filesl, MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  suasl_->openFile(filesl, Q(st_.daufile), Q(st_.tentm),
-                   DecodeForScreen(QByteArray(bytes->data(), bytes->size())));
+  suasl_->openFile(filesl, Q(st_.daufile), Q(st_.tentm), *text);
 }
 
 void MainWindow::trogiup_Click() {
