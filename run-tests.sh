@@ -11,7 +11,7 @@ case "$preset" in
 esac
 
 . tools/ensure-packages.sh
-ensure_packages cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev xvfb xauth \
+ensure_packages cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev qt6-l10n-tools qt6-tools-dev xvfb xauth \
   python3-ezdxf libbenchmark-dev fonts-dejavu-core
 
 export CMAKE_GENERATOR=Ninja

@@ -1,6 +1,13 @@
 #include "ui/ask.h"
 
+#include <QAbstractButton>
+#include <QApplication>
+#include <QDesktopServices>
+#include <QDialogButtonBox>
 #include <QMessageBox>
+#include <QPushButton>
+#include <QUrl>
+#include <utility>
 
 #include "ui/texts.h"
 
@@ -8,7 +15,10 @@ namespace kavu::ui {
 
 MsgAnswer Asker::operator()(const Question& question) const {
   if (hook_) return hook_(question);
-  return ShowMessageBox(parent_, question);
+  // Over the window the user works in (the editor, the find window), not over
+  // the main window, which may be hidden behind them.
+  QWidget* active = QApplication::activeWindow();
+  return ShowMessageBox(active != nullptr ? active : parent_, question);
 }
 
 QString ScreenLines(QString text) {
@@ -41,22 +51,54 @@ void SetUpMessageBox(QMessageBox& box, const Question& question) {
   box.setWindowTitle(Q(kAppTitle));
   box.setText(ScreenLines(question.text));
   box.setIcon(BoxIcon(question.icon));
-  if (question.buttons != MsgButtons::YesNo) {
-    box.setStandardButtons(QMessageBox::Ok);
-    return;
+  switch (question.buttons) {
+    case MsgButtons::Ok:
+      box.setStandardButtons(QMessageBox::Ok);
+      break;
+    case MsgButtons::YesNo:
+      box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
+      box.setDefaultButton(question.defaultNo ? QMessageBox::No : QMessageBox::Yes);
+      box.setEscapeButton(QMessageBox::No);
+      break;
+    case MsgButtons::YesNoCancel:
+      box.setStandardButtons(QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel);
+      box.setDefaultButton(QMessageBox::Yes);
+      box.setEscapeButton(QMessageBox::Cancel);
+      break;
   }
-  box.setStandardButtons(QMessageBox::Yes | QMessageBox::No);
-  box.setDefaultButton(question.defaultNo ? QMessageBox::No : QMessageBox::Yes);
-  box.setEscapeButton(QMessageBox::No);
+  for (const auto& [button, caption] :
+       {std::pair{QMessageBox::Yes, kYes}, std::pair{QMessageBox::No, kNo},
+        std::pair{QMessageBox::Ok, kOk}, std::pair{QMessageBox::Cancel, kCancel}}) {
+    if (QAbstractButton* shown = box.button(button)) shown->setText(Q(caption));
+  }
+  if (!question.folder.isEmpty()) {
+    // Opens the products' folder; the box stays for its answer.
+    QPushButton* open = box.addButton(Q(kOpenFolder), QMessageBox::ActionRole);
+    open->setObjectName(QStringLiteral("openFolder"));
+    open->disconnect(&box);
+    if (auto* buttons = box.findChild<QDialogButtonBox*>()) open->disconnect(buttons);
+    const QString folder = question.folder;
+    QObject::connect(open, &QPushButton::clicked, &box,
+                     [folder] { QDesktopServices::openUrl(QUrl::fromLocalFile(folder)); });
+  }
 }
 
 MsgAnswer ShowMessageBox(QWidget* parent, const Question& question) {
   QMessageBox box(parent);
   SetUpMessageBox(box, question);
   const int answer = box.exec();
-  if (question.buttons != MsgButtons::YesNo) return MsgAnswer::Ok;
-  // Closing the box counts as No.
-  return answer == QMessageBox::Yes ? MsgAnswer::Yes : MsgAnswer::No;
+  switch (question.buttons) {
+    case MsgButtons::Ok:
+      return MsgAnswer::Ok;
+    case MsgButtons::YesNo:
+      // Closing the box counts as No.
+      return answer == QMessageBox::Yes ? MsgAnswer::Yes : MsgAnswer::No;
+    case MsgButtons::YesNoCancel:
+      break;
+  }
+  // Closing the box counts as Cancel: nothing is lost.
+  if (answer == QMessageBox::Yes) return MsgAnswer::Yes;
+  return answer == QMessageBox::No ? MsgAnswer::No : MsgAnswer::Cancel;
 }
 
 }  // namespace kavu::ui

@@ -22,6 +22,9 @@ struct Question {
   MsgIcon icon = MsgIcon::None;
   MsgButtons buttons = MsgButtons::Ok;
   bool defaultNo = false;  // No is the default button of a Yes/No box
+  // A folder that a button of the box opens, the box staying (the run's
+  // products); empty for none.
+  QString folder;
 };
 
 class Asker {
@@ -29,11 +32,12 @@ class Asker {
   using Hook = std::function<MsgAnswer(const Question&)>;
 
   explicit Asker(QWidget* parent = nullptr) : parent_(parent) {}
-  // Shows the box (or hands it to the hook) and returns the answer.
+  // Shows the box over the window the user works in (or hands it to the
+  // hook) and returns the answer.
   MsgAnswer operator()(const Question& question) const;
   MsgAnswer operator()(const QString& text, MsgIcon icon, MsgButtons buttons,
                        bool defaultNo = false) const {
-    return (*this)(Question{text, icon, buttons, defaultNo});
+    return (*this)(Question{text, icon, buttons, defaultNo, {}});
   }
   void setHook(Hook hook) { hook_ = std::move(hook); }
   void setParent(QWidget* parent) { parent_ = parent; }
@@ -47,7 +51,8 @@ class Asker {
 // shows them.
 QString ScreenLines(QString text);
 
-// The box for a question, captioned with the program's title, not yet shown.
+// The box for a question, captioned with the program's title and with
+// Vietnamese buttons, not yet shown.
 void SetUpMessageBox(QMessageBox& box, const Question& question);
 // The message box itself.
 MsgAnswer ShowMessageBox(QWidget* parent, const Question& question);

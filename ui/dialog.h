@@ -3,7 +3,10 @@
 #pragma once
 
 #include <QDialog>
+#include <QString>
+#include <QStringList>
 
+class QFileDialog;
 class QPushButton;
 
 namespace kavu::ui {
@@ -23,6 +26,22 @@ class Window : public QDialog {
  private:
   QPushButton* cancel_ = nullptr;
 };
+
+// The open-file dialog with Vietnamese labels, in detail view and wide enough
+// for its columns, starting in folder with the first filter.
+void SetUpFileDialog(QFileDialog& dialog, const QStringList& filters);
+// That dialog shown: the chosen path, or the empty text when cancelled.
+QString ChooseFile(QWidget* parent, const QString& caption, const QString& folder,
+                   const QStringList& filters);
+
+// Qt's own texts in Vietnamese from the translation "kavu_vi.qm" in folder;
+// false when it is not there.
+bool InstallTranslation(const QString& folder);
+
+// A file the program ships (the help, the translation): beside the program in
+// the build folder, in share/kavu/ once installed. When neither exists, the
+// one beside the program, for the message that names it.
+QString ProgramDataFile(const QString& name);
 
 // A push button with its object name and caption.
 QPushButton* MakeButton(QWidget* parent, const char* name, const QString& caption);

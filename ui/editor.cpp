@@ -6,13 +6,25 @@
 #include <QFileInfo>
 #include <QFontDatabase>
 #include <QGuiApplication>
+#include <QMouseEvent>
+#include <QPainter>
 #include <QPlainTextEdit>
 #include <QPushButton>
 #include <QScreen>
+#include <QShortcut>
+#include <QTextBlock>
 #include <QTextDocument>
+#include <array>
+#include <cstring>
+#include <filesystem>
 #include <string>
+#include <system_error>
+#ifdef _WIN32
+#include <io.h>
+#else
+#include <unistd.h>
+#endif
 
-#include "core/lines.h"
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "ui/ask.h"
@@ -42,6 +54,15 @@ void Place(QWidget* window, bool rightPart, int buttonHeight) {
 // change.
 QString BoxText(const QPlainTextEdit* box) { return box->document()->toRawText(); }
 
+// The written bytes on the disk before the file takes the place of the old.
+bool SyncToDisk(int handle) {
+#ifdef _WIN32
+  return _commit(handle) == 0;
+#else
+  return ::fsync(handle) == 0;
+#endif
+}
+
 void Tell(const Asker& ask, const QString& path) {
   ask(Q(msg::kCannotWrite) + QDir::toNativeSeparators(path), MsgIcon::Critical, MsgButtons::Ok);
 }
@@ -49,8 +70,40 @@ void Tell(const Asker& ask, const QString& path) {
 }  // namespace
 
 QString DecodeForScreen(const QByteArray& bytes) {
-  const std::string utf8 = Tcvn3ToUtf8(std::string_view(bytes.constData(), bytes.size()));
-  return ScreenLines(Q(utf8));
+  // Every TCVN3 byte is one character of the screen's text: a table of the
+  // 256, then one pass over the file (a field book may have 20 MB).
+  static const std::array<char16_t, 256> kScreen = [] {
+    std::array<char16_t, 256> table{};
+    for (int b = 0; b < 256; ++b) {
+      const QString one = Q(Tcvn3ToUtf8(std::string(1, static_cast<char>(b))));
+      table[static_cast<std::size_t>(b)] = one.size() == 1 ? one[0].unicode() : u'?';
+    }
+    return table;
+  }();
+  QString text(bytes.size(), Qt::Uninitialized);
+  QChar* out = text.data();
+  qsizetype n = 0;
+  const qsizetype size = bytes.size();
+  for (qsizetype i = 0; i < size; ++i) {
+    const auto b = static_cast<unsigned char>(bytes[i]);
+    if (b == '\r') {
+      // CR LF and a lone CR each end a line.
+      if (i + 1 < size && bytes[i + 1] == '\n') ++i;
+      out[n++] = QLatin1Char('\n');
+    } else {
+      out[n++] = QChar(kScreen[b]);
+    }
+  }
+  text.truncate(n);
+  return text;
+}
+
+std::optional<QString> ReadScreenText(const QString& path) {
+  QFile file(path);
+  if (!file.open(QIODevice::ReadOnly)) return std::nullopt;
+  const QByteArray bytes = file.readAll();
+  if (file.error() != QFileDevice::NoError) return std::nullopt;
+  return DecodeForScreen(bytes);
 }
 
 QByteArray EncodeForFile(const QString& text) {
@@ -65,8 +118,9 @@ QByteArray EncodeForFile(const QString& text) {
 }
 
 bool SaveWithBackup(const Asker& ask, const QString& target, const QString& wantedBackup,
-                    const QString& text) {
-  if (ask(Q(kOverwrite), MsgIcon::Question, MsgButtons::YesNo, true) != MsgAnswer::Yes) {
+                    const QString& text, bool confirmed) {
+  if (!confirmed &&
+      ask(Q(kOverwrite), MsgIcon::Question, MsgButtons::YesNo, true) != MsgAnswer::Yes) {
     return false;
   }
   // A backup named like the file itself ("job1.bak" opened in the editor)
@@ -78,7 +132,8 @@ bool SaveWithBackup(const Asker& ask, const QString& target, const QString& want
     QFile out(scratch);
     const QByteArray bytes = EncodeForFile(text);
     const bool written = out.open(QIODevice::WriteOnly | QIODevice::Truncate) &&
-                         out.write(bytes) == bytes.size() && out.flush();
+                         out.write(bytes) == bytes.size() && out.flush() &&
+                         SyncToDisk(out.handle());
     out.close();
     if (!written || out.error() != QFileDevice::NoError) {
       QFile::remove(scratch);
@@ -91,14 +146,16 @@ bool SaveWithBackup(const Asker& ask, const QString& target, const QString& want
     Tell(ask, backup);
     return false;
   }
-  const bool hadTarget = QFile::exists(target);
-  if (hadTarget && !QFile::rename(target, backup)) {
+  // The old content is copied, not moved, to the backup: the file itself is
+  // there at every moment, then replaced by the new text in one step.
+  if (QFile::exists(target) && !QFile::copy(target, backup)) {
     QFile::remove(scratch);
-    Tell(ask, target);
+    Tell(ask, backup);
     return false;
   }
-  if (!QFile::rename(scratch, target)) {
-    if (hadTarget) QFile::rename(backup, target);
+  std::error_code failed;
+  std::filesystem::rename(scratch.toStdU16String(), target.toStdU16String(), failed);
+  if (failed) {
     QFile::remove(scratch);
     Tell(ask, target);
     return false;
@@ -106,30 +163,150 @@ bool SaveWithBackup(const Asker& ask, const QString& target, const QString& want
   return true;
 }
 
+QString PointOfReportLine(const QString& line) {
+  const QString trimmed = line.trimmed();
+  for (const char* lead : {"Diem: ", "Diem ", "Tram ", "Cac diem mia "}) {
+    if (!trimmed.startsWith(QLatin1String(lead))) continue;
+    return trimmed.mid(qsizetype(std::strlen(lead)))
+        .section(QLatin1Char(' '), 0, 0, QString::SectionSkipEmpty);
+  }
+  return {};
+}
+
+QString FirstField(const QString& line) {
+  // As the field splitter reads a record: tabs are blanks, runs of blanks one.
+  return line.simplified().section(QLatin1Char(' '), 0, 0);
+}
+
+class LineNumbers : public QWidget {
+ public:
+  explicit LineNumbers(NumberedText* text) : QWidget(text), text_(text) {}
+  QSize sizeHint() const override { return {text_->marginWidth(), 0}; }
+
+ protected:
+  void paintEvent(QPaintEvent* event) override { text_->paintMargin(event); }
+
+ private:
+  NumberedText* text_;
+};
+
+NumberedText::NumberedText(QWidget* parent) : QPlainTextEdit(parent) {
+  margin_ = new LineNumbers(this);
+  margin_->setObjectName(QStringLiteral("lineNumbers"));
+  connect(this, &QPlainTextEdit::blockCountChanged, this, &NumberedText::fitMargin);
+  connect(this, &QPlainTextEdit::updateRequest, this, [this](const QRect& rect, int dy) {
+    if (dy != 0) {
+      margin_->scroll(0, dy);
+    } else {
+      margin_->update(0, rect.y(), margin_->width(), rect.height());
+    }
+  });
+  fitMargin();
+}
+
+void NumberedText::fitMargin() {
+  const int width = marginWidth();
+  if (width == marginShown_) return;
+  marginShown_ = width;
+  setViewportMargins(width, 0, 0, 0);
+}
+
+int NumberedText::marginWidth() const {
+  int digits = 1;
+  for (int count = std::max(1, blockCount()); count >= 10; count /= 10) ++digits;
+  return 6 + fontMetrics().horizontalAdvance(QLatin1Char('9')) * std::max(digits, 3);
+}
+
+void NumberedText::resizeEvent(QResizeEvent* event) {
+  QPlainTextEdit::resizeEvent(event);
+  const QRect inner = contentsRect();
+  margin_->setGeometry(inner.left(), inner.top(), marginWidth(), inner.height());
+}
+
+void NumberedText::paintMargin(QPaintEvent* event) {
+  QPainter painter(margin_);
+  painter.fillRect(event->rect(), palette().color(QPalette::AlternateBase));
+  painter.setPen(palette().color(QPalette::PlaceholderText));
+  QTextBlock block = firstVisibleBlock();
+  int top = qRound(blockBoundingGeometry(block).translated(contentOffset()).top());
+  const int right = margin_->width() - 3;
+  while (block.isValid() && top <= event->rect().bottom()) {
+    const int height = qRound(blockBoundingRect(block).height());
+    if (block.isVisible() && top + height >= event->rect().top()) {
+      painter.drawText(0, top, right, fontMetrics().height(), Qt::AlignRight,
+                       QString::number(block.blockNumber() + 1));
+    }
+    top += height;
+    block = block.next();
+  }
+}
+
 TextWindow::TextWindow(const Asker& ask, Timthay& finder, int ktra, const char* boxName,
                        const char* saveName, const char* findName, QWidget* parent)
     : Window(parent), ask_(ask), finder_(finder), ktra_(ktra) {
-  text_ = new QPlainTextEdit(this);
+  text_ = new NumberedText(this);
   text_->setObjectName(QLatin1String(boxName));
   text_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
   text_->setLineWrapMode(QPlainTextEdit::NoWrap);
   save_ = MakeButton(this, saveName, Q(kSave));
   find_ = MakeButton(this, findName, Q(kFind));
+  // What a text editor's user presses without thinking.
+  const auto key = [this](QKeySequence sequence, auto action) {
+    auto* shortcut = new QShortcut(sequence, this);
+    shortcut->setContext(Qt::WindowShortcut);
+    connect(shortcut, &QShortcut::activated, this, action);
+  };
+  key(QKeySequence::Save, [this] { save(); });
+  key(QKeySequence::Find, [this] { find(); });
+  key(QKeySequence(Qt::Key_F3), [this] { finder_.findNext(ktra_); });
 }
 
-void TextWindow::showText(const QString& path, const QString& backup, std::string_view caption,
+bool TextWindow::showText(const QString& path, const QString& backup, std::string_view caption,
                           const QString& text) {
+  if (!maySave()) {
+    show();
+    raise();
+    return false;
+  }
   file_ = path;
   backup_ = backup;
   text_->setPlainText(text);
+  text_->document()->setModified(false);
   setWindowTitle(Q(caption) + QDir::toNativeSeparators(path));
   show();
   raise();
+  return true;
 }
 
-void TextWindow::save() {
-  if (file_.isEmpty()) return;
-  SaveWithBackup(ask_, file_, backup_, BoxText(text_));
+bool TextWindow::save(bool confirmed) {
+  if (file_.isEmpty()) return false;
+  if (!SaveWithBackup(ask_, file_, backup_, BoxText(text_), confirmed)) return false;
+  text_->document()->setModified(false);
+  return true;
+}
+
+bool TextWindow::maySave() {
+  if (file_.isEmpty() || !text_->document()->isModified()) return true;
+  switch (ask_(Q(kSaveChanges) + QDir::toNativeSeparators(file_) + QStringLiteral("?"),
+               MsgIcon::Question, MsgButtons::YesNoCancel)) {
+    case MsgAnswer::Yes:
+      return save(true);
+    case MsgAnswer::No:
+      text_->document()->setModified(false);
+      return true;
+    case MsgAnswer::Ok:
+    case MsgAnswer::Cancel:
+      break;
+  }
+  return false;
+}
+
+void TextWindow::closeEvent(QCloseEvent* event) {
+  if (!isVisible() || maySave()) {
+    event->accept();
+  } else {
+    event->ignore();
+  }
 }
 
 void TextWindow::find() { finder_.open(ktra_); }
@@ -138,9 +315,11 @@ Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
     : TextWindow(ask, finder, 2, "txtxem", "ghixem", "Timxem", parent) {
   setObjectName(QStringLiteral("xem"));
   setWindowTitle(Q(kViewerCaption));
-  // No cancel button: Esc must not close the viewer and drop its edits.
+  // No cancel button: Esc must not close the viewer by accident.
   thoat_ = MakeButton(this, "thoat", Q(kExit));
+  setMinimumSize(Px(3800 + 200), Px(2400));
   Place(this, false, thoat_->sizeHint().height());
+  text_->viewport()->installEventFilter(this);
   connect(save_, &QPushButton::clicked, this, &Xem::ghixem_Click);
   connect(find_, &QPushButton::clicked, this, &Xem::Timxem_Click);
   connect(thoat_, &QPushButton::clicked, this, &Xem::thoat_Click);
@@ -150,6 +329,20 @@ void Xem::showFile(const QString& path, const QString& text) {
   // The backup keeps the whole name, so a report's backup never replaces the
   // field book's "name.bak".
   showText(path, path + QStringLiteral(".bak"), kMoreAboutFile, text);
+}
+
+bool Xem::eventFilter(QObject* watched, QEvent* event) {
+  // A double click on a line of the error report shows the point's record.
+  if (watched == text_->viewport() && event->type() == QEvent::MouseButtonDblClick && openPoint_) {
+    const auto* click = static_cast<QMouseEvent*>(event);
+    const QString point =
+        PointOfReportLine(text_->cursorForPosition(click->position().toPoint()).block().text());
+    if (!point.isEmpty()) {
+      openPoint_(file(), point);
+      return true;
+    }
+  }
+  return TextWindow::eventFilter(watched, event);
 }
 
 void Xem::resizeEvent(QResizeEvent* event) {
@@ -173,37 +366,64 @@ Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
   thoat_ = MakeButton(this, "thoat", Q(kExit));
   setCancelButton(thoat_);
   chooser_ = [this](const QString& folder, const QString& proposed) {
-    QFileDialog dialog(this, Q(kViewFile), folder);
-    dialog.setFileMode(QFileDialog::ExistingFile);
-    dialog.selectFile(proposed);
-    if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty()) return proposed;
-    return dialog.selectedFiles().first();
+    const QString chosen = ChooseFile(this, Q(kViewFile), folder, {Q(kErrFiles), Q(kAllFiles)});
+    return chosen.isEmpty() ? proposed : chosen;
   };
+  // The four buttons side by side, with a margin.
+  setMinimumSize(Px(4300 + 200), Px(2400));
   Place(this, true, thoat_->sizeHint().height());
+  viewer_.setPointOpener([this](const QString& report, const QString& point) {
+    // The report "name.err" belongs to the field book "name.asc".
+    const QString book = QFileInfo(report).path() + QDir::separator() +
+                         QFileInfo(report).completeBaseName() + QStringLiteral(".asc");
+    showPoint(QDir::toNativeSeparators(book), point);
+  });
   connect(save_, &QPushButton::clicked, this, &Suasl::ghi_Click);
   connect(find_, &QPushButton::clicked, this, &Suasl::timkiem_Click);
   connect(xemfile_, &QPushButton::clicked, this, &Suasl::xemfile_Click);
   connect(thoat_, &QPushButton::clicked, this, &Suasl::thoat_Click);
 }
 
-void Suasl::openFile(const QString& filesl, const QString& daufile, const QString& tentm,
+bool Suasl::openFile(const QString& filesl, const QString& daufile, const QString& tentm,
                      const QString& text) {
   // The file is kept as it was opened: a later click in the main window's
   // file list must not send this text over another file.
+  if (!showText(filesl, daufile + QStringLiteral(".bak"), kDataOfFile, text)) return false;
   tentm_ = tentm;
-  showText(filesl, daufile + QStringLiteral(".bak"), kDataOfFile, text);
+  return true;
+}
+
+bool Suasl::showPoint(const QString& book, const QString& point) {
+  if (QFileInfo(book) != QFileInfo(file()) || !isVisible()) {
+    const std::optional<QString> text = ReadScreenText(book);
+    // The backup base is the path before its first ".", as for the main
+    // window's file.
+    if (!text ||
+        !openFile(book, book.section(QLatin1Char('.'), 0, 0), QFileInfo(book).path(), *text)) {
+      return false;
+    }
+  }
+  QTextBlock block = text_->document()->firstBlock();
+  while (block.isValid() && FirstField(block.text()) != point) block = block.next();
+  if (!block.isValid()) return false;
+  text_->setTextCursor(QTextCursor(block));
+  text_->centerCursor();
+  show();
+  raise();
+  activateWindow();
+  return true;
 }
 
 void Suasl::xemfile_Click() {
   const QString proposed = Q(kErrPattern);
   const QString chosen = chooser_ ? chooser_(tentm_, proposed) : QString();
   if (chosen.isEmpty() || chosen == proposed) return;
-  const std::optional<std::string> bytes = ReadFileBytes(chosen.toStdString());
-  if (!bytes) {
+  const std::optional<QString> text = ReadScreenText(chosen);
+  if (!text) {
     ask_(Q(msg::kCannotOpen) + QDir::toNativeSeparators(chosen), MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  viewer_.showFile(chosen, DecodeForScreen(QByteArray(bytes->data(), bytes->size())));
+  viewer_.showFile(chosen, *text);
 }
 
 void Suasl::resizeEvent(QResizeEvent* event) {

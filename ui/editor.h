@@ -3,13 +3,14 @@
 #pragma once
 
 #include <QByteArray>
+#include <QPlainTextEdit>
 #include <QString>
 #include <functional>
+#include <optional>
 #include <string_view>
 
 #include "ui/dialog.h"
 
-class QPlainTextEdit;
 class QPushButton;
 
 namespace kavu::ui {
@@ -19,17 +20,43 @@ class Timthay;
 
 // A file's TCVN3 bytes as screen text (every line end becomes LF).
 QString DecodeForScreen(const QByteArray& bytes);
+// A whole file as screen text; nothing when it cannot be read.
+std::optional<QString> ReadScreenText(const QString& path);
 // Screen text as the file's TCVN3 bytes with CR LF line ends; a final line
 // break is added only when the text does not end with one.
 QByteArray EncodeForFile(const QString& text);
 
-// Asks, then keeps the old content of target as backup (as target + ".bak"
-// when backup names target itself) and writes text over target. The new text
-// goes to a scratch file first, so a failing write or rename leaves the
-// original or its backup in place; the user is told. True when the text was
-// saved.
+// Asks (unless confirmed already), then keeps the old content of target as
+// backup (as target + ".bak" when backup names target itself) and writes text
+// over target. The new text goes to a scratch file first, flushed, so a
+// failing write or rename leaves the original or its backup in place; the
+// user is told. True when the text was saved.
 bool SaveWithBackup(const Asker& ask, const QString& target, const QString& backup,
-                    const QString& text);
+                    const QString& text, bool confirmed = false);
+
+// The point a line of the error report names ("Diem P12 ...", "Diem: P12 ...",
+// "Tram K3 ..."), or the empty text.
+QString PointOfReportLine(const QString& line);
+// The first field of a record (the point's name), as the field splitter reads
+// it.
+QString FirstField(const QString& line);
+
+// A plain-text box with the line numbers in a margin on its left.
+class NumberedText : public QPlainTextEdit {
+ public:
+  explicit NumberedText(QWidget* parent = nullptr);
+  int marginWidth() const;
+
+ protected:
+  void resizeEvent(QResizeEvent* event) override;
+
+ private:
+  friend class LineNumbers;
+  void paintMargin(QPaintEvent* event);
+  void fitMargin();
+  QWidget* margin_;
+  int marginShown_ = -1;
+};
 
 // Chooses a file to view: the folder to start in and the proposed name; the
 // empty text or the proposed name itself when nothing was chosen.
@@ -41,7 +68,11 @@ class TextWindow : public Window {
   Q_OBJECT
  public:
   QString file() const { return file_; }
+  // Closes the window; unsaved edits are saved or dropped as the user says.
   void thoat_Click() { close(); }
+  // Asks whether to save unsaved edits: true when they are saved or may be
+  // dropped, false when the user stays (or the save failed).
+  bool maySave();
 
  protected:
   // Builds the text box, then the save and find buttons (in that tab order);
@@ -50,10 +81,12 @@ class TextWindow : public Window {
              const char* findName, QWidget* parent);
   // Shows a file's text, captioned with the file's name behind caption; saves
   // go to path, its old content to backup.
-  void showText(const QString& path, const QString& backup, std::string_view caption,
+  // False, and nothing changed, when the user keeps unsaved edits.
+  bool showText(const QString& path, const QString& backup, std::string_view caption,
                 const QString& text);
-  void save();
+  bool save(bool confirmed = false);
   void find();
+  void closeEvent(QCloseEvent* event) override;
 
   const Asker& ask_;
   QPlainTextEdit* text_;
@@ -74,12 +107,21 @@ class Xem : public TextWindow {
   QPlainTextEdit* txtxem() const { return text_; }
   // Shows a file's text; its saves go to that file, the backup beside it.
   void showFile(const QString& path, const QString& text);
+  // Called with the report's path and the point that a double-clicked line
+  // names.
+  void setPointOpener(std::function<void(const QString&, const QString&)> opener) {
+    openPoint_ = std::move(opener);
+  }
 
   void ghixem_Click() { save(); }
   void Timxem_Click() { find(); }
 
  protected:
   void resizeEvent(QResizeEvent* event) override;  // Form_Resize
+  bool eventFilter(QObject* watched, QEvent* event) override;
+
+ private:
+  std::function<void(const QString&, const QString&)> openPoint_;
 };
 
 class Suasl : public TextWindow {
@@ -91,8 +133,12 @@ class Suasl : public TextWindow {
 
   // The main window's file: its path, the base name of its backup, and its
   // folder (where the viewer's dialog starts).
-  void openFile(const QString& filesl, const QString& daufile, const QString& tentm,
+  // False when the user kept the unsaved edits of the file shown.
+  bool openFile(const QString& filesl, const QString& daufile, const QString& tentm,
                 const QString& text);
+  // The field book at the first record of a point (from a line of its error
+  // report); false when the book or the point is not there.
+  bool showPoint(const QString& book, const QString& point);
 
   void ghi_Click() { save(); }
   void timkiem_Click() { find(); }

@@ -18,6 +18,7 @@
 #include <cstdio>
 
 #include "ui/ask.h"
+#include "ui/dialog.h"
 #include "ui/editor.h"
 #include "ui/mainwindow.h"
 #include "ui/openfile.h"
@@ -75,6 +76,8 @@ int ComputeAlone(kavu::ui::MainWindow& window, const QString& file, const QStrin
 int main(int argc, char** argv) {
   QApplication app(argc, argv);
   QApplication::setApplicationName(Q(kavu::ui::kAppTitle));
+  kavu::ui::InstallTranslation(
+      QFileInfo(kavu::ui::ProgramDataFile(QStringLiteral("kavu_vi.qm"))).path());
   QCommandLineParser parser;
   parser.addHelpOption();
   const QCommandLineOption compute(QStringLiteral("compute"),

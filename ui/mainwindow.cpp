@@ -5,6 +5,8 @@
 #include <QCloseEvent>
 #include <QComboBox>
 #include <QDir>
+#include <QDragEnterEvent>
+#include <QDropEvent>
 #include <QFile>
 #include <QFileDialog>
 #include <QFileInfo>
@@ -13,11 +15,14 @@
 #include <QHBoxLayout>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMenu>
+#include <QMimeData>
 #include <QPushButton>
 #include <QTextBrowser>
+#include <QToolButton>
+#include <QUrl>
 #include <QVBoxLayout>
 
-#include "core/lines.h"
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "import/dispatch.h"
@@ -83,19 +88,13 @@ void RestoreBox(QCheckBox* box, const QString& stored) {
 
 std::string Std(const QString& text) { return text.toStdString(); }
 
+// The recent files: a key of their own, the paths one a line.
+constexpr const char* kRecentKey = "KAVU_Recent";
+constexpr qsizetype kRecentCount = 8;
+
 #ifdef _WIN32
 constexpr const char* kDefaultFolder = "c:\\";
 #endif
-
-// The help file: beside the program in the build folder, in share/kavu/ once
-// installed. When neither exists the message names the one beside the program.
-QString HelpFilePath() {
-  const QString folder = QCoreApplication::applicationDirPath();
-  const QString beside = QDir::toNativeSeparators(folder + QStringLiteral("/kavu.hlp"));
-  const QString installed = QDir::toNativeSeparators(
-      QDir::cleanPath(folder + QStringLiteral("/" KAVU_INSTALLED_HELP_DIR "/kavu.hlp")));
-  return !QFileInfo(beside).isFile() && QFileInfo(installed).isFile() ? installed : beside;
-}
 
 }  // namespace
 
@@ -116,17 +115,15 @@ MainWindow::MainWindow(QWidget* parent) : Window(parent), ask_(this) {
   setWindowTitle(Q(kMainCaption));
   endHook_ = [] { QCoreApplication::quit(); };
   chooseControlFile_ = [this] {
-    return QFileDialog::getOpenFileName(this, Q(kChooseKcFile), lsttm_->path());
+    return ChooseFile(this, Q(kChooseKcFile), lsttm_->path(), {Q(kAllFiles)});
   };
+  setAcceptDrops(true);
   buildControls();
-  timthay_ = new Timthay(
-      ask_,
-      [this](int ktra) -> QPlainTextEdit* {
-        return ktra == 1 ? suasl_->txtsuasl() : xem_->txtxem();
-      },
-      this);
-  xem_ = new Xem(ask_, *timthay_, this);
-  suasl_ = new Suasl(ask_, *timthay_, *xem_, this);
+  timthay_ = std::make_unique<Timthay>(ask_, [this](int ktra) -> QPlainTextEdit* {
+    return ktra == 1 ? suasl_->txtsuasl() : xem_->txtxem();
+  });
+  xem_ = std::make_unique<Xem>(ask_, *timthay_);
+  suasl_ = std::make_unique<Suasl>(ask_, *timthay_, *xem_);
   // Before the settings apply, the lists stand at the working folder.
   {
     const QSignalBlocker block(lstdia_);
@@ -136,7 +133,7 @@ MainWindow::MainWindow(QWidget* parent) : Window(parent), ask_(this) {
   Form_Load();
 }
 
-MainWindow::~MainWindow() = default;
+MainWindow::~MainWindow() { delete nhapsdo_.data(); }
 
 void MainWindow::buildControls() {
   auto* lbtieude = MakeLabel(this, "lbtieude", kTitleLabel);
@@ -161,6 +158,13 @@ void MainWindow::buildControls() {
   lstfile_->setObjectName(QStringLiteral("lstfile"));
   auto* lbfile = MakeLabel(this, "lbfile", kFile);
   txtfile_ = MakeEdit(this, "txtfile", QString());
+  auto* recent = new QToolButton(this);
+  recent->setObjectName(QStringLiteral("recent"));
+  recent->setText(Q(kRecent));
+  recent->setPopupMode(QToolButton::InstantPopup);
+  recentMenu_ = new QMenu(recent);
+  recent->setMenu(recentMenu_);
+  connect(recentMenu_, &QMenu::aboutToShow, this, &MainWindow::fillRecentMenu);
 
   auto* luachon = new QGroupBox(Q(kOptions), this);
   luachon->setObjectName(QStringLiteral("luachon"));
@@ -223,6 +227,7 @@ void MainWindow::buildControls() {
   auto* fileRow = new QHBoxLayout;
   fileRow->addWidget(lbfile);
   fileRow->addWidget(txtfile_);
+  fileRow->addWidget(recent);
   grid->addLayout(fileRow, 2, 0, 1, 3);
 
   auto* right = new QVBoxLayout;
@@ -257,6 +262,11 @@ void MainWindow::buildControls() {
   connect(lstdia_, &QComboBox::currentIndexChanged, this, &MainWindow::lstdia_Change);
   connect(lsttm_, &FolderList::pathChanged, this, &MainWindow::lsttm_Change);
   connect(lstfile_, &QListWidget::itemClicked, this, &MainWindow::lstfile_Click);
+  // Moving the selection with the keys (or in code) chooses as a click does.
+  connect(lstfile_, &QListWidget::itemSelectionChanged, this, [this] {
+    const QList<QListWidgetItem*> selected = lstfile_->selectedItems();
+    if (!selected.isEmpty()) lstfile_Click(selected.first());
+  });
   connect(lstfile_, &QListWidget::itemDoubleClicked, this, &MainWindow::lstfile_DblClick);
   connect(fsdo_, &QCheckBox::clicked, this, &MainWindow::fsdo_Click);
   connect(kc, &QPushButton::clicked, this, &MainWindow::KC_Click);
@@ -293,6 +303,15 @@ void MainWindow::Form_Load() {
   RestoreBox(fcp_, store.read("KAVU_Fcp", QStringLiteral("0")));
   RestoreBox(fdc_, store.read("KAVU_Fdc", QStringLiteral("1")));
   txttm_->setText(ShortFolderText(lsttm_->path()));
+  // Beyond the window's thirteen keys: the recent files, the last chosen
+  // first, which is chosen again.
+  for (const QString& path : store.read(kRecentKey, QString()).split(QLatin1Char('\n'))) {
+    if (!path.isEmpty() && recent_.size() < kRecentCount) recent_.append(path);
+  }
+  if (!recent_.isEmpty() && QFileInfo(recent_.first()).isFile()) {
+    DeriveFileSelection(st_, Std(recent_.first()));
+    txtfile_->setText(recent_.first());
+  }
 }
 
 void MainWindow::GhiCaiDat() {
@@ -340,6 +359,12 @@ void MainWindow::lstdia_Change() { lsttm_->setPath(lstdia_->root(lstdia_->curren
 void MainWindow::lsttm_Change(const QString& path) {
   lstfile_->setPath(path);
   txttm_->setText(ShortFolderText(path));
+  // The drive list shows the drive of the folder shown.
+  const int drive = lstdia_->indexOfPath(path);
+  if (drive >= 0 && drive != lstdia_->currentIndex()) {
+    const QSignalBlocker block(lstdia_);
+    lstdia_->setCurrentIndex(drive);
+  }
 }
 
 void MainWindow::lstfile_Click(QListWidgetItem* item) {
@@ -347,6 +372,66 @@ void MainWindow::lstfile_Click(QListWidgetItem* item) {
   const QString path = QDir::toNativeSeparators(QDir(lstfile_->path()).filePath(item->text()));
   DeriveFileSelection(st_, Std(path));
   txtfile_->setText(Q(st_.filesl));
+  remember(Q(st_.filesl));
+}
+
+bool MainWindow::chooseFile(const QString& path) {
+  const QFileInfo info(path);
+  if (!info.isFile()) return false;
+  const int kind = KindOfExtension(Std(info.suffix().toUpper()));
+  if (!QDir::match(lstfile_->pattern(), info.fileName())) setKind(kind);
+  if (lsttm_->setPath(info.absolutePath())) {
+    const QList<QListWidgetItem*> items = lstfile_->findItems(info.fileName(), Qt::MatchExactly);
+    if (!items.isEmpty()) {
+      lstfile_->setCurrentItem(items.first());
+      lstfile_->scrollToItem(items.first());
+      return true;
+    }
+  }
+  // Not listed (a hidden file): chosen all the same.
+  DeriveFileSelection(st_, Std(QDir::toNativeSeparators(info.absoluteFilePath())));
+  txtfile_->setText(Q(st_.filesl));
+  remember(Q(st_.filesl));
+  return true;
+}
+
+void MainWindow::remember(const QString& path) {
+  recent_.removeAll(path);
+  recent_.prepend(path);
+  while (recent_.size() > kRecentCount) recent_.removeLast();
+}
+
+void MainWindow::fillRecentMenu() {
+  recentMenu_->clear();
+  for (const QString& path : recent_) {
+    QAction* action = recentMenu_->addAction(path, this, [this, path] { chooseFile(path); });
+    action->setEnabled(QFileInfo(path).isFile());
+  }
+}
+
+void MainWindow::takeTypedFile() {
+  const std::string typed = Std(txtfile_->text());
+  if (typed.empty() || typed == st_.filesl) return;
+  DeriveFileSelection(st_, typed);
+  if (QFileInfo(txtfile_->text()).isFile()) remember(txtfile_->text());
+}
+
+void MainWindow::dragEnterEvent(QDragEnterEvent* event) {
+  for (const QUrl& url : event->mimeData()->urls()) {
+    if (url.isLocalFile() && QFileInfo(url.toLocalFile()).isFile()) {
+      event->acceptProposedAction();
+      return;
+    }
+  }
+}
+
+void MainWindow::dropEvent(QDropEvent* event) {
+  for (const QUrl& url : event->mimeData()->urls()) {
+    if (url.isLocalFile() && chooseFile(url.toLocalFile())) {
+      event->acceptProposedAction();
+      return;
+    }
+  }
 }
 
 void MainWindow::lstfile_DblClick(QListWidgetItem* item) {
@@ -379,6 +464,7 @@ void MainWindow::collectWindowFields() {
 
 void MainWindow::tinh_Click() {
   if (running_ || ending_) return;
+  takeTypedFile();
   running_ = true;
   collectWindowFields();
   QApplication::setOverrideCursor(Qt::WaitCursor);
@@ -387,13 +473,14 @@ void MainWindow::tinh_Click() {
   running_ = false;
   if (lastRun_.outcome == RunOutcome::Completed && lastRun_.answer == MsgAnswer::No) {
     // No to "continue?" ends the program; the session's choices are kept.
+    if (!editsSettled()) return;
     writeSettingsOnce();
     endProgram();
   }
 }
 
 Nhapsdo& MainWindow::headerForm() {
-  if (nhapsdo_.isNull()) nhapsdo_ = new Nhapsdo(this);
+  if (nhapsdo_.isNull()) nhapsdo_ = new Nhapsdo();
   return *nhapsdo_;
 }
 
@@ -412,34 +499,35 @@ void MainWindow::KC_Click() {
 }
 
 void MainWindow::suasolieu_Click() {
+  // A path typed into the file box counts as a click in the list does.
+  takeTypedFile();
   const QString filesl = Q(st_.filesl);
   if (txtfile_->text().isEmpty() || !QFileInfo(filesl).isFile()) {
     tbao_ = ask_(Q(kFileNotFoundShort) + filesl, MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  const std::optional<std::string> bytes = ReadFileBytes(st_.filesl);
-  if (!bytes) {
+  const std::optional<QString> text = ReadScreenText(filesl);
+  if (!text) {
     tbao_ = ask_(Q(msg::kCannotOpen) + filesl, MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  suasl_->openFile(filesl, Q(st_.daufile), Q(st_.tentm),
-                   DecodeForScreen(QByteArray(bytes->data(), bytes->size())));
+  suasl_->openFile(filesl, Q(st_.daufile), Q(st_.tentm), *text);
 }
 
 void MainWindow::trogiup_Click() {
-  const QString path = HelpFilePath();
+  const QString path = ProgramDataFile(QStringLiteral("kavu.hlp"));
   QFile file(path);
   if (!QFileInfo(path).isFile() || !file.open(QIODevice::ReadOnly)) {
     tbao_ = ask_(Q(kFileNotFoundShort) + path, MsgIcon::Critical, MsgButtons::Ok);
     return;
   }
-  if (help_.isNull()) {
-    help_ = new Window(this);
+  if (!help_) {
+    help_ = std::make_unique<Window>();
     help_->setObjectName(QStringLiteral("help"));
     help_->setWindowTitle(Q(kViewerCaption));
-    auto* browser = new QTextBrowser(help_);
+    auto* browser = new QTextBrowser(help_.get());
     browser->setObjectName(QStringLiteral("helptext"));
-    auto* layout = new QVBoxLayout(help_);
+    auto* layout = new QVBoxLayout(help_.get());
     layout->addWidget(browser);
     help_->resize(640, 560);
   }
@@ -452,7 +540,7 @@ void MainWindow::trogiup_Click() {
 void MainWindow::thoat_Click() {
   Beep();
   tbao_ = ask_(Q(kExitQuestion), MsgIcon::Question, MsgButtons::YesNo);
-  if (tbao_ != MsgAnswer::Yes) return;
+  if (tbao_ != MsgAnswer::Yes || !editsSettled()) return;
   writeSettingsOnce();
   endProgram();
 }
@@ -461,7 +549,10 @@ void MainWindow::writeSettingsOnce() {
   if (settingsWritten_) return;
   settingsWritten_ = true;
   GhiCaiDat();
+  SettingsStore().write(kRecentKey, recent_.join(QLatin1Char('\n')));
 }
+
+bool MainWindow::editsSettled() { return suasl_->maySave() && xem_->maySave(); }
 
 void MainWindow::endProgram() {
   if (ending_) return;
@@ -469,8 +560,9 @@ void MainWindow::endProgram() {
   // The other windows close with their own closing steps (the header form
   // keeps its texts).
   if (!nhapsdo_.isNull()) nhapsdo_->close();
-  for (QWidget* window : {static_cast<QWidget*>(timthay_), static_cast<QWidget*>(xem_),
-                          static_cast<QWidget*>(suasl_), static_cast<QWidget*>(help_.data())}) {
+  for (QWidget* window :
+       {static_cast<QWidget*>(timthay_.get()), static_cast<QWidget*>(xem_.get()),
+        static_cast<QWidget*>(suasl_.get()), static_cast<QWidget*>(help_.get())}) {
     if (window != nullptr) window->close();
   }
   close();
@@ -480,7 +572,7 @@ void MainWindow::endProgram() {
 void MainWindow::closeEvent(QCloseEvent* event) {
   // The run does not give way to the window until its summary; a request to
   // close that arrives while it redraws the title is refused.
-  if (running_) {
+  if (running_ || (!ending_ && !editsSettled())) {
     event->ignore();
     return;
   }
@@ -490,7 +582,10 @@ void MainWindow::closeEvent(QCloseEvent* event) {
 }
 
 MsgAnswer MainWindow::MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) {
-  tbao_ = ask_(Q(text), icon, buttons);
+  Question question{Q(text), icon, buttons, false, {}};
+  // The run's summary offers the folder of its products.
+  if (text.starts_with(msg::kTotalStations)) question.folder = Q(st_.tentm);
+  tbao_ = ask_(question);
   return tbao_;
 }
 

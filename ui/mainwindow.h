@@ -4,7 +4,9 @@
 
 #include <QPointer>
 #include <QString>
+#include <QStringList>
 #include <functional>
+#include <memory>
 
 #include "core/host.h"
 #include "core/run.h"
@@ -17,6 +19,7 @@ class QComboBox;
 class QLabel;
 class QLineEdit;
 class QListWidgetItem;
+class QMenu;
 class QPushButton;
 
 namespace kavu::ui {
@@ -57,6 +60,14 @@ class MainWindow : public Window, public Host {
   Suasl& editor() { return *suasl_; }
   Xem& viewer() { return *xem_; }
   Timthay& finder() { return *timthay_; }
+  // The help window, once the help was asked for.
+  Window* helpWindow() { return help_.get(); }
+  // The last files chosen, the latest first (at most eight).
+  QStringList recentFiles() const { return recent_; }
+  // A file dropped on the window, picked from the recent files or given on
+  // the command line becomes the chosen file, as a click in the list makes
+  // it; false when it is no file.
+  bool chooseFile(const QString& path);
   // The header form, loaded (hidden) when it is not.
   Nhapsdo& headerForm();
   bool headerFormLoaded() const { return !nhapsdo_.isNull(); }
@@ -86,6 +97,8 @@ class MainWindow : public Window, public Host {
 
  protected:
   void closeEvent(QCloseEvent* event) override;  // Form_Unload
+  void dragEnterEvent(QDragEnterEvent* event) override;
+  void dropEvent(QDropEvent* event) override;
 
  private:
   void buildControls();
@@ -95,6 +108,13 @@ class MainWindow : public Window, public Host {
   void collectWindowFields();
   void writeSettingsOnce();
   void endProgram();
+  // Unsaved edits of the editor and the viewer saved or dropped as the user
+  // says; false when the user stays.
+  bool editsSettled();
+  // The file typed into txtfile, when it is not the chosen one, becomes it.
+  void takeTypedFile();
+  void remember(const QString& path);
+  void fillRecentMenu();
 
   RunState st_;
   RunResult lastRun_;
@@ -105,6 +125,7 @@ class MainWindow : public Window, public Host {
   bool settingsWritten_ = false;
   bool ending_ = false;
   bool running_ = false;
+  QStringList recent_;
 
   DriveList* lstdia_ = nullptr;
   FolderList* lsttm_ = nullptr;
@@ -118,12 +139,15 @@ class MainWindow : public Window, public Host {
   QLineEdit* Htxt_ = nullptr;
   QLineEdit* txtSoleDC_ = nullptr;
   QLineEdit* txtFKC_ = nullptr;
+  QMenu* recentMenu_ = nullptr;
 
-  Timthay* timthay_ = nullptr;
-  Xem* xem_ = nullptr;
-  Suasl* suasl_ = nullptr;
+  // The side windows are windows of their own, not tied to this one, so that
+  // the user stacks them at will.
+  std::unique_ptr<Timthay> timthay_;
+  std::unique_ptr<Xem> xem_;
+  std::unique_ptr<Suasl> suasl_;
+  std::unique_ptr<Window> help_;
   QPointer<Nhapsdo> nhapsdo_;
-  QPointer<Window> help_;
 };
 
 }  // namespace kavu::ui

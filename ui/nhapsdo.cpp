@@ -1,6 +1,7 @@
 #include "ui/nhapsdo.h"
 
 #include <QCloseEvent>
+#include <QDate>
 #include <QGridLayout>
 #include <QHBoxLayout>
 #include <QLabel>
@@ -26,8 +27,14 @@ Nhapsdo::Nhapsdo(QWidget* parent) : Window(parent) {
   for (int i = 0; i < 7; ++i) {
     auto* label = new QLabel(Q(kHeaderLabels[i]), this);
     label->setObjectName(QStringLiteral("Label%1").arg(i + 1));
-    auto* box = new QLineEdit(store.read(kKeys[i], Q(kHeaderDefaults[i])), this);
+    // The survey date defaults to today, in the 10 characters of its field.
+    const QString fallback = i == 6 ? QDate::currentDate().toString(QStringLiteral("dd/MM/yyyy"))
+                                    : Q(kHeaderDefaults[i]);
+    auto* box = new QLineEdit(this);
     box->setObjectName(QStringLiteral("nhap%1").arg(i + 1));
+    // No more than the sketch's field shows: nothing is cut unseen.
+    box->setMaxLength(kHeaderWidths[i]);
+    box->setText(store.read(kKeys[i], fallback));
     box->setMinimumWidth(280);
     label->setBuddy(box);
     grid->addWidget(label, i, 0);

@@ -11,6 +11,20 @@ namespace kavu::ui {
 inline constexpr std::string_view kAppTitle = "KAVU";
 inline constexpr std::string_view kSettingsGroup = "Settings";
 
+// Buttons and labels of the standard boxes and file dialogs.
+inline constexpr std::string_view kYes = "Có";
+inline constexpr std::string_view kNo = "Không";
+inline constexpr std::string_view kOk = "Đồng ý";
+inline constexpr std::string_view kCancel = "Hủy";
+inline constexpr std::string_view kOpen = "Mở";
+inline constexpr std::string_view kLookIn = "Tìm trong:";
+inline constexpr std::string_view kFileName = "Tên File:";
+inline constexpr std::string_view kFileType = "Kiểu File:";
+inline constexpr std::string_view kAllFiles = "Mọi File (*)";
+inline constexpr std::string_view kErrFiles = "File báo lỗi (*.err)";
+inline constexpr std::string_view kOpenFolder = "Mở thư mục";
+inline constexpr std::array<std::string_view, 4> kFileColumns = {"Tên", "Cỡ", "Kiểu", "Ngày sửa"};
+
 // Main window.
 inline constexpr std::string_view kMainCaption = "Xử lý số liệu đo toạ độ, độ cao chi tiết";
 inline constexpr std::string_view kTitleLabel = "chương trình tính toạ độ, độ cao điểm chi tiết";
@@ -48,14 +62,22 @@ inline constexpr std::string_view kFileNotFoundShort = "Không tìm thấy File 
 inline constexpr std::string_view kDataOfFile = "Số liệu của File: ";
 inline constexpr std::string_view kExitQuestion = "Bạn có muốn thoát khỏi chương trình không ?";
 inline constexpr std::string_view kChooseKcFile = "File KC";
+inline constexpr std::string_view kRecent = "Gần đây";
 
 // Field-book header form.
 inline constexpr std::string_view kHeaderCaption = "Nhập thông tin về sổ đo";
 inline constexpr std::array<std::string_view, 7> kHeaderLabels = {
     "Khu đo:", "Lược đồ số:", "Máy đo:", "Số máy: ", "Người đo:", "Người ghi:", "Ngày đo:"};
 inline constexpr std::array<std::string_view, 7> kHeaderDefaults = {
-    "Xã Tân Phú, huyện Đông Sơn", "01", "TOPCOM 226", "23756", "Nguyễn Văn An", "Trần Văn Bình",
-    "Ngày  tháng năm 2003"};
+    "Xã Tân Phú, huyện Đông Sơn",
+    "01",
+    "TOPCOM 226",
+    "23756",
+    "Nguyễn Văn An",
+    "Trần Văn Bình",
+    ""};  // the date: today's, as dd/mm/yyyy
+// The characters the field sketch keeps of each text.
+inline constexpr std::array<int, 7> kHeaderWidths = {39, 6, 19, 20, 17, 18, 10};
 inline constexpr std::string_view kEnter = "Nhập";
 
 // Editor, viewer, help.
@@ -68,6 +90,8 @@ inline constexpr std::string_view kFind = "Tìm";
 inline constexpr std::string_view kViewFile = "Xem File";
 inline constexpr std::string_view kOverwrite = "Có ghi đè lên File số liệu đã có không ?";
 inline constexpr std::string_view kErrPattern = "*.err";
+// Asked before unsaved edits are dropped: this text, the path, "?".
+inline constexpr std::string_view kSaveChanges = "Lưu thay đổi vào File ";
 
 // Find and replace.
 inline constexpr std::string_view kFindCaption = "Tìm kiếm và thay thế";

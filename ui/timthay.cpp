@@ -11,6 +11,7 @@
 #include <QScreen>
 #include <QTextCursor>
 #include <QVBoxLayout>
+#include <vector>
 
 #include "ui/ask.h"
 #include "ui/texts.h"
@@ -20,12 +21,15 @@ namespace {
 
 bool IsWordChar(QChar c) { return c.isLetterOrNumber() || c == QLatin1Char('_'); }
 
-// The selection becomes the text; the caret stands behind it.
-void ReplaceSelection(QPlainTextEdit* target, const QString& text) {
-  if (target == nullptr) return;
-  QTextCursor cursor = target->textCursor();
-  cursor.insertText(text);
-  target->setTextCursor(cursor);
+// The box's text, its lines separated by one character each, so that its
+// positions are those of the box's cursor.
+QString BoxText(const QPlainTextEdit* box) { return box->document()->toRawText(); }
+
+void Select(QPlainTextEdit* box, qsizetype start, qsizetype length) {
+  QTextCursor cursor = box->textCursor();
+  cursor.setPosition(static_cast<int>(start));
+  cursor.setPosition(static_cast<int>(start + length), QTextCursor::KeepAnchor);
+  box->setTextCursor(cursor);
 }
 
 }  // namespace
@@ -106,44 +110,106 @@ void Timthay::txttim_Change() {
   thay2_->setEnabled(any);
 }
 
+QPlainTextEdit* Timthay::target() const { return target_ ? target_(ktra_) : nullptr; }
+
+qsizetype Timthay::search(const QString& text, qsizetype from) const {
+  return FindText(text, txttim_->text(), from, chon2_->isChecked(), chon1_->isChecked());
+}
+
 int Timthay::funtim() {
   const QString chuoitim = txttim_->text();
-  QPlainTextEdit* target = target_ ? target_(ktra_) : nullptr;
-  if (target == nullptr || chuoitim.isEmpty()) return 0;
-  const QString chuoigoc = target->toPlainText();
-  QTextCursor cursor = target->textCursor();
+  QPlainTextEdit* box = target();
+  if (box == nullptr || chuoitim.isEmpty()) return 0;
+  QTextCursor cursor = box->textCursor();
   const qsizetype vttim = cursor.selectionStart() + 1;
   // The search starts at 1-based position vttim + 1: one character past the
-  // selection's start, so a match right at the caret is passed over.
-  const qsizetype found =
-      FindText(chuoigoc, chuoitim, vttim, chon2_->isChecked(), chon1_->isChecked());
+  // selection's start, so "Tìm tiếp" moves on from the match it showed.
+  const qsizetype found = search(BoxText(box), vttim);
   if (found >= 0) {
-    cursor.setPosition(static_cast<int>(found));
-    cursor.setPosition(static_cast<int>(found + chuoitim.size()), QTextCursor::KeepAnchor);
-    target->setTextCursor(cursor);
+    Select(box, found, chuoitim.size());
     return static_cast<int>(found + 1);
   }
+  notFound(box);
+  return 0;
+}
+
+void Timthay::notFound(QPlainTextEdit* box) {
   if (ask_(Q(kNotFoundAgain), MsgIcon::Question, MsgButtons::YesNo) == MsgAnswer::Yes) {
+    QTextCursor cursor = box->textCursor();
     cursor.setPosition(0);
-    target->setTextCursor(cursor);
+    box->setTextCursor(cursor);
   } else {
     unload();
   }
-  return 0;
 }
 
 void Timthay::tim_Click() { funtim(); }
 
+void Timthay::findNext(int ktra) {
+  ktra_ = ktra;
+  if (txttim_->text().isEmpty() || !isVisible()) {
+    open(ktra);
+    txttim_->setFocus();
+    return;
+  }
+  funtim();
+}
+
 void Timthay::thay1_Click() {
-  const QString chuoithay = txtthay_->text();
-  const int ktra = ktra_;
-  if (funtim() == 0) return;
-  ReplaceSelection(target_(ktra), chuoithay);
+  QPlainTextEdit* box = target();
+  const QString chuoitim = txttim_->text();
+  if (box == nullptr || chuoitim.isEmpty()) return;
+  QTextCursor cursor = box->textCursor();
+  const qsizetype start = cursor.selectionStart();
+  const qsizetype found = search(BoxText(box), start);
+  if (found < 0) {
+    notFound(box);
+    return;
+  }
+  // Only the match the user sees is replaced: one that is not selected yet
+  // is shown first.
+  if (found != start || cursor.selectionEnd() != found + chuoitim.size()) {
+    Select(box, found, chuoitim.size());
+    return;
+  }
+  cursor.insertText(txtthay_->text());
+  box->setTextCursor(cursor);
+  const qsizetype next = search(BoxText(box), cursor.position());
+  if (next >= 0) Select(box, next, chuoitim.size());
 }
 
 void Timthay::thay2_Click() {
-  const int ktra = ktra_;
-  while (funtim() != 0) ReplaceSelection(target_(ktra), txtthay_->text());
+  QPlainTextEdit* box = target();
+  const QString chuoitim = txttim_->text();
+  if (box == nullptr || chuoitim.isEmpty()) return;
+  // Every match from the caret on, the one at the caret included, found in
+  // one pass over the text and replaced as one step of undo.
+  const QString text = BoxText(box);
+  std::vector<qsizetype> matches;
+  for (qsizetype at = search(text, box->textCursor().selectionStart()); at >= 0;
+       at = search(text, at + chuoitim.size())) {
+    matches.push_back(at);
+  }
+  if (!matches.empty()) {
+    const QString chuoithay = txtthay_->text();
+    QTextCursor cursor(box->document());
+    cursor.beginEditBlock();
+    // From the end back, so the positions found stay valid.
+    for (auto at = matches.rbegin(); at != matches.rend(); ++at) {
+      cursor.setPosition(static_cast<int>(*at));
+      cursor.setPosition(static_cast<int>(*at + chuoitim.size()), QTextCursor::KeepAnchor);
+      cursor.insertText(chuoithay);
+    }
+    cursor.endEditBlock();
+    const qsizetype behind =
+        matches.back() +
+        static_cast<qsizetype>(matches.size() - 1) * (chuoithay.size() - chuoitim.size()) +
+        chuoithay.size();
+    cursor.setPosition(static_cast<int>(behind));
+    box->setTextCursor(cursor);
+  }
+  // The search that finds nothing more asks its question, as a step does.
+  notFound(box);
 }
 
 void Timthay::thoat_Click() { close(); }

@@ -31,11 +31,18 @@ class Timthay : public Window {
   void open(int ktra);
   int ktra() const { return ktra_; }
 
-  // One search step; the 1-based position of the match selected, or 0.
+  // One search step from one character past the selection's start; the
+  // 1-based position of the match selected, or 0.
   int funtim();
   void tim_Click();
+  // Replaces the selected match and selects the next; a match not yet
+  // selected (the first one from the caret on) is selected first.
   void thay1_Click();
+  // Replaces every match from the caret on, the one at the caret included.
   void thay2_Click();
+  // F3 in the editor or the viewer: the next match, or the window when there
+  // is nothing to search for.
+  void findNext(int ktra);
   void thoat_Click();
 
  protected:
@@ -44,6 +51,10 @@ class Timthay : public Window {
  private:
   void txttim_Change();
   void unload();
+  QPlainTextEdit* target() const;
+  qsizetype search(const QString& text, qsizetype from) const;
+  // The not-found question: Yes moves the caret to the top, No unloads.
+  void notFound(QPlainTextEdit* box);
 
   const Asker& ask_;
   std::function<QPlainTextEdit*(int)> target_;

@@ -2,10 +2,18 @@
 // byte for byte with their backups, and the saves that cannot be made.
 #include "ui/editor.h"
 
+#include <QDesktopServices>
 #include <QDir>
+#include <QFileDialog>
+#include <QLineEdit>
+#include <QMenu>
+#include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QTextBlock>
 #include <QtTest>
+#include <functional>
+#include <memory>
 
 #include "core/messages.h"
 #include "support.h"
@@ -55,6 +63,10 @@ class EditorTest : public QObject {
   Q_OBJECT
 
   QTemporaryDir store_;
+  QUrl opened_;
+
+ public slots:
+  void opened(const QUrl& url) { opened_ = url; }
 
  private slots:
   void init() { UseScratchSettings(store_); }
@@ -192,6 +204,151 @@ class EditorTest : public QObject {
     QCOMPARE(asked[3].icon, MsgIcon::Critical);
     QCOMPARE(desk.read("job1.asc"), QByteArray("book\r\n"));
     QVERIFY(!QFile::exists(desk.path("job1.asc.kavu-new")));
+  }
+
+  void unsavedEditsAreNeverDroppedUnasked() {
+    // Every way out of the editor and the viewer, with each answer.
+    struct Way {
+      const char* name;
+      std::function<void(Editing&, TextWindow&)> leave;
+    };
+    const std::vector<Way> ways = {
+        {"Esc", [](Editing&, TextWindow& window) { QTest::keyClick(&window, Qt::Key_Escape); }},
+        {"Thoat", [](Editing& desk, TextWindow& window) { desk.press(window, "thoat"); }},
+        {"close box", [](Editing&, TextWindow& window) { window.close(); }},
+        {"program exit", [](Editing& desk, TextWindow&) { desk.press(desk.w, "thoat"); }},
+    };
+    for (const bool viewer : {false, true}) {
+      for (const Way& way : ways) {
+        // The viewer has no cancel button: Esc leaves it open and asks nothing.
+        const bool escInViewer = viewer && QByteArray(way.name) == "Esc";
+        for (const MsgAnswer answer : {MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}) {
+          Editing desk({{"job1.asc", "book\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
+          TextWindow* window = &desk.editor();
+          const char* name = "job1.asc";
+          if (viewer) {
+            desk.view("job1.err");
+            window = &desk.viewer();
+            name = "job1.err";
+          }
+          window->findChild<QPlainTextEdit*>()->appendPlainText(QStringLiteral("edited"));
+          // The program's exit asks its own question first.
+          desk.person.answers = {MsgAnswer::Yes, answer};
+          if (way.name != QByteArrayView("program exit")) desk.person.answers.pop_front();
+          const QByteArray before = desk.read(name);
+          way.leave(desk, *window);
+          const QString what =
+              QStringLiteral("%1 %2 %3").arg(viewer).arg(way.name).arg(int(answer));
+          if (escInViewer) {
+            QVERIFY2(window->isVisible() && desk.person.asked.empty(), qPrintable(what));
+            continue;
+          }
+          const Question& asked = desk.person.asked.back();
+          QVERIFY2(asked.text == Q(kSaveChanges) + QDir::toNativeSeparators(desk.path(name)) + "?",
+                   qPrintable(what));
+          QCOMPARE(asked.buttons, MsgButtons::YesNoCancel);
+          const bool stays = answer == MsgAnswer::Cancel;
+          QVERIFY2(window->isVisible() == stays, qPrintable(what));
+          QVERIFY2((desk.read(name) == before) != (answer == MsgAnswer::Yes), qPrintable(what));
+          QVERIFY2(desk.ended != stays || way.name != QByteArrayView("program exit"),
+                   qPrintable(what));
+        }
+      }
+    }
+  }
+
+  void aReportLineOpensTheFieldBookAtItsPoint() {
+    struct Case {
+      const char *line, *point;
+    };
+    for (const Case& c :
+         {Case{"Diem P2 nhap sai phan do", "P2"}, Case{"  Diem: K1 nhap so lieu bi dinh", "K1"},
+          Case{"Tram K3         Dinh huong K2", "K3"},
+          Case{"Cac diem mia 12 - 15 khong duoc tinh", "12"}, Case{"Tong so loi", ""}}) {
+      QCOMPARE(PointOfReportLine(QLatin1String(c.line)), QLatin1String(c.point));
+    }
+    Editing desk({{"job1.asc",
+                   "TR K1 1.5\r\nDKD K2\r\nP1 0 1 0900000 1.5\r\n"
+                   "P2\t10 1 0900000 1.5\r\nP2 20 1 0900000 1.5\r\n"},
+                  {"job1.err", "\r\nDiem P2 nhap sai phan do\r\n"},
+                  {"other.asc", "x\r\n"}},
+                 "other.asc");
+    desk.view("job1.err");
+    QPlainTextEdit* report = desk.viewer().txtxem();
+    const QRect line = report->cursorRect(QTextCursor(report->document()->findBlockByNumber(1)));
+    QTest::mouseDClick(report->viewport(), Qt::LeftButton, {}, line.center());
+    QCOMPARE(desk.editor().file(), QDir::toNativeSeparators(desk.path("job1.asc")));
+    QCOMPARE(desk.editor().txtsuasl()->textCursor().blockNumber(), 3);
+  }
+
+  void theEditorShowsLineNumbersAndKnowsItsKeys() {
+    QByteArray book;
+    for (int i = 1; i <= 120; ++i)
+      book += "P" + QByteArray::number(i) + " 0 10.000 0900000 1.50\r\n";
+    Editing desk({{"job1.asc", book}}, "job1.asc");
+    Suasl& editor = desk.editor();
+    editor.resize(560, 420);
+    editor.activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(&editor));
+    QTest::keyClick(editor.txtsuasl(), Qt::Key_F, Qt::ControlModifier);
+    QVERIFY(desk.w.finder().isVisible());
+    QCOMPARE(desk.w.finder().ktra(), 1);
+    Child<QLineEdit>(desk.w.finder(), "txttim")->setText(QStringLiteral("P12 "));
+    QTest::keyClick(editor.txtsuasl(), Qt::Key_F3);
+    QCOMPARE(editor.txtsuasl()->textCursor().selectedText(), QStringLiteral("P12 "));
+    editor.txtsuasl()->insertPlainText(QStringLiteral("P12a "));
+    QTest::keyClick(editor.txtsuasl(), Qt::Key_S, Qt::ControlModifier);
+    QCOMPARE(desk.person.asked.back().text, Q(kOverwrite));
+    QVERIFY(desk.read("job1.asc").contains("P12a 0 10.000"));
+    // The margin with the line numbers, in a picture beside the build.
+    auto* numbers = Child<QWidget>(editor, "lineNumbers");
+    QVERIFY(numbers->isVisible() && numbers->width() > 0);
+    editor.txtsuasl()->centerCursor();
+    QVERIFY(editor.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-editor-line-numbers.png")));
+  }
+
+  void theStandardDialogsSpeakVietnamese() {
+    // Qt's own texts through the project's translation, when it was built.
+    if (QFile::exists(QStringLiteral(KAVU_TRANSLATION "/kavu_vi.qm"))) {
+      QVERIFY(InstallTranslation(QStringLiteral(KAVU_TRANSLATION)));
+      QLineEdit edit;
+      const std::unique_ptr<QMenu> menu(edit.createStandardContextMenu());
+      QStringList items;
+      for (const QAction* action : menu->actions())
+        items.append(action->text().section('\t', 0, 0));
+      QVERIFY(items.contains(Q("&Dán")));
+      QVERIFY(items.contains(Q("Chọn tất cả")));
+    }
+    QMessageBox box;
+    SetUpMessageBox(box, Question{Q(kSaveChanges) + QStringLiteral("/data/job1.asc?"),
+                                  MsgIcon::Question,
+                                  MsgButtons::YesNoCancel,
+                                  false,
+                                  {}});
+    QStringList captions;
+    for (QAbstractButton* button : box.buttons()) captions.append(button->text());
+    captions.sort();
+    QCOMPARE(captions, QStringList({Q("Có"), Q("Hủy"), Q("Không")}));
+    QCOMPARE(box.escapeButton(), box.button(QMessageBox::Cancel));
+    box.show();
+    QVERIFY(box.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-save-question.png")));
+    box.hide();
+    SetUpMessageBox(box,
+                    Question{QStringLiteral("x"), MsgIcon::Critical, MsgButtons::Ok, false, {}});
+    QCOMPARE(box.buttons().size(), 1);
+    QCOMPARE(box.buttons().first()->text(), Q("Đồng ý"));
+
+    QTemporaryDir folder;
+    WriteAll(folder.filePath(QStringLiteral("job1.err")), "x");
+    WriteAll(folder.filePath(QStringLiteral("job1.asc")), "x");
+    QFileDialog dialog(nullptr, Q(kViewFile), folder.path());
+    SetUpFileDialog(dialog, {Q(kErrFiles), Q(kAllFiles)});
+    QCOMPARE(dialog.labelText(QFileDialog::LookIn), Q("Tìm trong:"));
+    QCOMPARE(dialog.labelText(QFileDialog::Reject), Q("Hủy"));
+    QCOMPARE(dialog.selectedNameFilter(), Q(kErrFiles));
+    dialog.show();
+    QApplication::processEvents();
+    QVERIFY(dialog.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-file-dialog.png")));
   }
 
   void findOpensOnTheRightTextAndTheWindowsClose() {

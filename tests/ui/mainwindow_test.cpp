@@ -6,9 +6,12 @@
 #include <QComboBox>
 #include <QDir>
 #include <QLineEdit>
+#include <QMimeData>
 #include <QPushButton>
+#include <QScreen>
 #include <QTextBrowser>
 #include <QtTest>
+#include <functional>
 
 #include "core/messages.h"
 #include "core/tcvn3.h"
@@ -17,6 +20,7 @@
 #include "ui/lists.h"
 #include "ui/nhapsdo.h"
 #include "ui/openfile.h"
+#include "ui/timthay.h"
 
 using namespace kavu;
 using namespace kavu::ui;
@@ -113,6 +117,76 @@ class MainWindowTest : public QObject {
     QVERIFY(desk.person.asked.empty());
   }
 
+  void theCurrentFileIsTheChosenOne() {
+    // However the list's current file changes, it is the chosen file.
+    struct Way {
+      const char* name;
+      std::function<void(MainWindow&, FileList*)> move;
+    };
+    const std::vector<Way> ways = {
+        {"mouse", [](MainWindow& w, FileList*) { ClickFile(w, QStringLiteral("b.asc")); }},
+        {"keys",
+         [](MainWindow& w, FileList* list) {
+           ClickFile(w, QStringLiteral("a.asc"));
+           QTest::keyClick(list, Qt::Key_Down);
+         }},
+        {"program", [](MainWindow&, FileList* list) { list->setCurrentRow(1); }},
+        {"dropped",
+         [](MainWindow& w, FileList* list) {
+           QMimeData data;
+           data.setUrls({QUrl::fromLocalFile(list->path() + "/b.asc")});
+           QDropEvent drop(QPointF(10, 10), Qt::CopyAction, &data, Qt::LeftButton, {});
+           // Straight to the window: the application passes on only drops of
+           // a drag it runs itself.
+           static_cast<QObject&>(w).event(&drop);
+         }},
+    };
+    for (const Way& way : ways) {
+      Desk desk;
+      for (const char* name : {"a.asc", "b.asc", "c.asc"}) desk.write(name, "x\r\n");
+      desk.w.show();
+      QVERIFY(Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path()));
+      way.move(desk.w, Child<FileList>(desk.w, "lstfile"));
+      QVERIFY2(Q(desk.w.state().filesl) == Native(desk.path("b.asc")), way.name);
+      QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), Native(desk.path("b.asc")));
+      QCOMPARE(desk.w.recentFiles().value(0), Native(desk.path("b.asc")));
+    }
+  }
+
+  void aTypedPathCountsForEveryButton() {
+    Desk desk;
+    desk.write("typed.asc", "TR A 1.5\r\n");
+    desk.w.show();
+    Child<QLineEdit>(desk.w, "txtfile")->setText(Native(desk.path("typed.asc")));
+    Child<QPushButton>(desk.w, "suasolieu")->click();
+    QVERIFY(desk.w.editor().isVisible());
+    QCOMPARE(desk.w.editor().file(), Native(desk.path("typed.asc")));
+    QCOMPARE(Q(desk.w.state().daufile), Native(desk.path("typed")));
+    // A typed path that is not there is named in the message.
+    Child<QLineEdit>(desk.w, "txtfile")->setText(Native(desk.path("gone.asc")));
+    Child<QPushButton>(desk.w, "suasolieu")->click();
+    QCOMPARE(desk.person.asked.back().text, Q(kFileNotFoundShort) + Native(desk.path("gone.asc")));
+  }
+
+  void theLastFilesAreRemembered() {
+    QString first;
+    {
+      Desk desk;
+      desk.write("a.asc", "x\r\n");
+      desk.write("b.asc", "x\r\n");
+      desk.w.chooseFile(desk.path("a.asc"));
+      desk.w.chooseFile(desk.path("b.asc"));
+      desk.w.chooseFile(desk.path("a.asc"));
+      QCOMPARE(desk.w.recentFiles(),
+               QStringList({Native(desk.path("a.asc")), Native(desk.path("b.asc"))}));
+      desk.w.close();
+      MainWindow again;
+      QCOMPARE(again.recentFiles(), desk.w.recentFiles());
+      QCOMPARE(Child<QLineEdit>(again, "txtfile")->text(), Native(desk.path("a.asc")));
+      QCOMPARE(Q(again.state().filesl), Native(desk.path("a.asc")));
+    }
+  }
+
   void aComputeEndsWithTheSummary() {
     Desk desk;
     MainWindow& w = desk.w;
@@ -136,6 +210,7 @@ class MainWindowTest : public QObject {
     QCOMPARE(lines[1], Q(msg::kTotalPoints) + QStringLiteral(" 110"));
     QCOMPARE(lines[2], Q(msg::kTotalErrors) + QStringLiteral(" 0"));
     QCOMPARE(lines[6], Q(msg::kContinue));
+    QCOMPARE(QDir::cleanPath(summary.folder), QDir::cleanPath(desk.work.path()));
 
     QVERIFY(titles.contains(Q(msg::kStationTitle) + QStringLiteral("DC01        ")));
     QCOMPARE(w.windowTitle(), Q(msg::kProgramTitle));
@@ -220,9 +295,24 @@ class MainWindowTest : public QObject {
     // The manual beside the program, opened without a question.
     Child<QPushButton>(desk.w, "trogiup")->click();
     QCOMPARE(asked.size(), 1u);
-    auto* help = Child<QWidget>(desk.w, "help");
-    QVERIFY(help->isVisible());
+    Window* help = desk.w.helpWindow();
+    QVERIFY(help != nullptr && help->isVisible());
     QVERIFY(help->findChild<QTextBrowser*>()->toPlainText().contains(QStringLiteral("Inputs")));
+  }
+
+  void sideWindowsAreWindowsOfTheirOwn() {
+    // Not tied to the main window, so none of them always covers another;
+    // the editor on the right two fifths, the viewer on the left three.
+    MainWindow w;
+    for (QWidget* side :
+         std::initializer_list<QWidget*>{&w.editor(), &w.viewer(), &w.finder(), &w.headerForm()}) {
+      QVERIFY(side->isWindow());
+      QVERIFY(side->parentWidget() == nullptr);
+    }
+    const QRect area = QGuiApplication::primaryScreen()->availableGeometry();
+    QCOMPARE(w.editor().x(), area.left() + area.width() / 5 * 3);
+    QCOMPARE(w.viewer().x(), area.left());
+    QCOMPARE(w.viewer().width(), area.width() / 5 * 3);
   }
 
   void controlFileChoice() {

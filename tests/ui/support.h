@@ -41,7 +41,7 @@ T* Child(QObject& window, const char* name) {
   return child;
 }
 
-// Records every box and answers with the queued answers, then with Yes / OK.
+// Records every box and answers with the queued answers, then with OK or Yes.
 struct Person {
   std::vector<Question> asked;
   std::deque<MsgAnswer> answers;
@@ -54,7 +54,7 @@ struct Person {
         answers.pop_front();
         return answer;
       }
-      return question.buttons == MsgButtons::YesNo ? MsgAnswer::Yes : MsgAnswer::Ok;
+      return question.buttons == MsgButtons::Ok ? MsgAnswer::Ok : MsgAnswer::Yes;
     };
   }
 };

@@ -1,5 +1,6 @@
-// Find and replace: each step searches from one character past the start of
-// the selection; the not-found question, replace and replace all.
+// Find and replace: each find step searches from one character past the start
+// of the selection; replace works on the match the user sees, replace all on
+// every match from the caret on; the not-found question.
 #include "ui/timthay.h"
 
 #include <QCheckBox>
@@ -106,35 +107,69 @@ class TimthayTest : public QObject {
     QCOMPARE(bench.find.funtim(), 5);  // from the top: the second abc again
   }
 
-  void replaceAllAsksOnceAtTheEnd() {
+  void replaceAllFromTheCaretInOneStep() {
     struct Case {
-      const char *text, *needle, *replacement, *result;
+      const char *text, *needle, *replacement;
+      int start, length;  // the selection before
+      const char* result;
     };
-    for (const Case& c : {Case{"xaxa", "a", "b", "xbxb"},
-                          // A match right behind a replacement is passed over.
-                          Case{"xaa", "a", "bb", "xbba"},
-                          // Nothing to find: the text stays as it was.
-                          Case{"abc", "z", "y", "abc"}}) {
+    for (const Case& c :
+         {Case{"xaxa", "a", "b", 0, 0, "xbxb"},
+          // Adjacent matches, and the one at the very start.
+          Case{"aa-a", "a", "bb", 0, 0, "bbbb-bb"},
+          // From the caret on, the match at the caret included.
+          Case{"a-a-a", "a", "b", 2, 0, "a-b-b"},
+          // ... and the match that "Tìm tiếp" showed.
+          Case{"a-a-a", "a", "b", 2, 1, "a-b-b"}, Case{"x ABC abc", "abc", "d", 0, 0, "x d d"},
+          // Nothing to find: the text stays as it was.
+          Case{"abc", "z", "y", 0, 0, "abc"}}) {
       Bench bench(QLatin1String(c.text), QLatin1String(c.needle), QLatin1String(c.replacement));
+      bench.select(c.start, c.length);
       bench.press("thay2");
       QCOMPARE(bench.text.toPlainText(), QLatin1String(c.result));
-      QCOMPARE(bench.person.asked.size(), 1u);
+      QCOMPARE(bench.person.asked.size(), 1u);  // the not-found question, once
+      // One step of undo takes every replacement back.
+      bench.text.undo();
+      QCOMPARE(bench.text.toPlainText(), QLatin1String(c.text));
     }
   }
 
-  void replaceOne() {
-    Bench bench(QStringLiteral("a-a-a"), QStringLiteral("a"), Q("ă"));
-    bench.press("thay1");
-    QCOMPARE(bench.text.toPlainText(), Q("a-ă-a"));
-    QCOMPARE(bench.selStart(), 3);  // the caret behind the new text
-    QCOMPARE(bench.selLength(), 0);
+  void replaceShowsBeforeItReplaces() {
+    struct Case {
+      const char *text, *needle;
+      int start, length;    // the selection before
+      const char* presses;  // f "Tìm tiếp", r "Thay thế"
+      const char* result;
+      int selStart, selLength;  // the selection after
+    };
+    for (const Case& c : {
+             // The match at the caret is shown first, then replaced, then the
+             // next one shown.
+             Case{"a-a-a", "a", 0, 0, "r", "a-a-a", 0, 1},
+             Case{"a-a-a", "a", 0, 0, "rr", "X-a-a", 2, 1},
+             // After "Tìm tiếp": the match it showed is the one replaced.
+             Case{"abc abc", "abc", 0, 0, "fr", "abc X", 5, 0},
+             // Selected at the start of the file.
+             Case{"abc abc", "abc", 0, 3, "r", "X abc", 2, 3},
+             // A selection that is no match: the next match is shown.
+             Case{"abc abc", "abc", 1, 2, "r", "abc abc", 4, 3},
+         }) {
+      Bench bench(QLatin1String(c.text), QLatin1String(c.needle), QStringLiteral("X"));
+      bench.select(c.start, c.length);
+      for (const char* key = c.presses; *key != 0; ++key)
+        bench.press(*key == 'f' ? "tim" : "thay1");
+      QCOMPARE(bench.text.toPlainText(), QLatin1String(c.result));
+      QCOMPARE(bench.selStart(), c.selStart);
+      QCOMPARE(bench.selLength(), c.selLength);
+      QCOMPARE(bench.person.asked.size(), 0u);
+    }
 
     // Nothing found: the question, the text unchanged on either answer; No
     // closes the window.
-    bench.type("txttim", QStringLiteral("z"));
+    Bench bench(QStringLiteral("a-a"), QStringLiteral("z"), QStringLiteral("X"));
     bench.person.answers = {MsgAnswer::No};
     bench.press("thay1");
-    QCOMPARE(bench.text.toPlainText(), Q("a-ă-a"));
+    QCOMPARE(bench.text.toPlainText(), QStringLiteral("a-a"));
     QCOMPARE(bench.person.asked.size(), 1u);
     QVERIFY(!bench.find.isVisible());
     QCOMPARE(bench.find.ktra(), 0);
