@@ -50,6 +50,7 @@ class WorkingCopy {
   explicit WorkingCopy(RunState& st) : st_(st) {}
   bool AtEnd() const { return next_ >= st_.tamsl.size(); }
   void ReadLine() {
+    st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
     st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
     st_.MangTruong = SplitFields(st_.dong);
     st_.stp = static_cast<int>(st_.MangTruong.size());
@@ -93,7 +94,8 @@ void HandleBodyRecord(RunState& st) {
   }
   const std::string name = Trim(st.TenDiem.str());
   if (stp < 5 && name != "TR" && name != "DKD") {
-    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether));
+    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether),
+                st.TenDiem.str());
   }
 }
 
@@ -102,12 +104,23 @@ struct Counters {
   long long bodyRecords = 0;
 };
 
-void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& counters) {
+void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& counters,
+                    std::size_t recordLine) {
   host.SetTitle(std::string(msg::kStationTitle) + Tcvn3ToUtf8(st.TenTram.str()));
   ++counters.stations;
   TinhPhuongViCanh(st);
   st.cdhdau = RoundEven(st.cdh, 3);
   st.pvd = st.gpv;
+  StationResult station;
+  station.station = {Trim(st.TenTram.str()), st.xTR, st.yTR, std::nullopt};
+  if (!Trim(st.StZTram).empty() && Ticked(st.fdc)) station.station.h = st.zTR;
+  station.orientation = {Trim(st.TenDinhHuong.str()), st.xDKD, st.yDKD, std::nullopt};
+  if (!Trim(st.StZDinhHuong).empty() && Ticked(st.fdc)) station.orientation.h = st.zDKD;
+  // gpv is the azimuth from the orientation point to the station.
+  station.bearing = st.gpv >= 180 ? st.gpv - 180 : st.gpv + 180;
+  station.orientationDistance = st.cdhdau;
+  station.line = recordLine;
+  st.survey.stations.push_back(std::move(station));
   st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
   if (Ticked(st.fsdo)) {
     st.TenDinhHuong2 = "";
@@ -145,7 +158,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   incocphu(st);
 }
 
-void SkipStation(RunState& st, WorkingCopy& copy) {
+void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   st.dctdau = 1;
   while (st.Field(0) != "TR" && !copy.AtEnd()) {
     copy.ReadLine();
@@ -158,8 +171,11 @@ void SkipStation(RunState& st, WorkingCopy& copy) {
     }
     st.TenDiem = st.Field(0);
   }
-  st.errFile.Line(std::string(msg::kSkippedFrom) + st.DiemDau.str() + std::string(msg::kSkippedTo) +
-                  st.DiemCuoi.str() + std::string(msg::kSkippedEnd));
+  const std::string line = std::string(msg::kSkippedFrom) + st.DiemDau.str() +
+                           std::string(msg::kSkippedTo) + st.DiemCuoi.str() +
+                           std::string(msg::kSkippedEnd);
+  st.errFile.Line(line);
+  st.survey.report.push_back({line, std::string(), stationLine});
 }
 
 // Station and orientation records of a block; I = 0 when it cannot be computed.
@@ -174,8 +190,9 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     st.DongTram = st.TenKC.str();
     // A height that is no number is as good as none: computed with 0.
     if (!HasNumber(st.ccm)) {
-      ReportError(
-          st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
+      ReportError(st,
+                  std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight),
+                  st.TenKC.str());
     }
     TimToaDoDiem(st);
     st.TenTram = st.TenKC.str();
@@ -194,8 +211,9 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     }
   } else {
     st.I = 0;
-    ReportError(
-        st, std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether));
+    ReportError(st,
+                std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether),
+                st.Field(0));
   }
 
   copy.ReadLine();
@@ -220,8 +238,9 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     }
   } else {
     st.I = 0;
-    ReportError(st, std::string(msg::kPointColon) + st.Field(0) +
-                        std::string(msg::kOrientationRunTogether));
+    ReportError(
+        st, std::string(msg::kPointColon) + st.Field(0) + std::string(msg::kOrientationRunTogether),
+        st.Field(0));
   }
 }
 
@@ -261,6 +280,7 @@ RunResult Finish(RunState& st, RunOutcome outcome) {
   result.outcome = outcome;
   result.err = st.err;
   result.unwritable = st.unwritable;
+  result.survey = std::move(st.survey);
   return result;
 }
 
@@ -318,11 +338,12 @@ RunResult tinh_Click(RunState& st, Host& host) {
   WorkingCopy copy(st);
   copy.ReadLine();
   while (!copy.AtEnd()) {
+    const std::size_t stationLine = st.line;
     ReadStationHeader(st, copy);
     if (st.I != 0) {
-      ComputeStation(st, host, copy, counters);
+      ComputeStation(st, host, copy, counters, stationLine);
     } else {
-      SkipStation(st, copy);
+      SkipStation(st, copy, stationLine);
     }
   }
 

@@ -12,6 +12,7 @@
 #include "core/angles.h"
 #include "core/lines.h"
 #include "core/random.h"
+#include "core/survey.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -133,6 +134,15 @@ struct ComputationFields {
   // The working copy of the field book (without its control-point records),
   // held in memory so that runs never share a file.
   std::vector<std::string> tamsl;
+  // The field-book line (from 1) of each line of the working copy, and of the
+  // record being read (0 when none).
+  std::vector<std::size_t> tamslLine;
+  std::size_t line = 0;
+
+  // What the run found, in numbers.
+  Survey survey;
+  // Whether the point last looked up has a height text.
+  bool hasZ = false;
 
   // Files kept open through the station loop.
   TextOut errFile;  // error report .err
@@ -156,7 +166,8 @@ struct RunState : WindowFields, FileSelection, ComputationFields {
   void ResetComputation() { static_cast<ComputationFields&>(*this) = ComputationFields{}; }
 };
 
-// Appends an empty line and a message line to the error report and counts it.
-void ReportError(RunState& st, std::string_view line);
+// Appends an empty line and a message line to the error report and counts it;
+// point is the name the line concerns (empty when none).
+void ReportError(RunState& st, std::string_view line, std::string_view point = {});
 
 }  // namespace kavu

@@ -40,6 +40,7 @@ bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& f
   std::vector<std::string> fields;
   st.MangKhongChe.clear();
   st.tamsl.clear();
+  st.tamslLine.clear();
   if (commonFile) {
     const std::string path = Trim(st.txtFKC);
     if (path.empty()) {
@@ -58,21 +59,25 @@ bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& f
       return false;
     }
     host.SetTitle(msg::kReadingControlFile);
+    st.line = 0;
     for (const std::string& raw : *lines) {
       if (ReadRecord(raw, line, fields) && IsControlRecord(fields)) AddControlPoint(st, fields);
     }
     host.SetTitle(msg::kReadingData);
   }
   host.SetTitle(msg::kFindingControlPoints);
-  for (const std::string& raw : fieldBook) {
-    if (!ReadRecord(raw, line, fields)) continue;
+  for (std::size_t k = 0; k < fieldBook.size(); ++k) {
+    if (!ReadRecord(fieldBook[k], line, fields)) continue;
+    st.line = k + 1;
     if (IsControlRecord(fields)) {
       // With a common file the field book's own control points are ignored.
       if (!commonFile) AddControlPoint(st, fields);
     } else {
       st.tamsl.push_back(line);
+      st.tamslLine.push_back(k + 1);
     }
   }
+  st.line = 0;
   WritePegFileHead(st);
   return true;
 }

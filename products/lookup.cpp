@@ -48,6 +48,17 @@ void TakeCoordinates(RunState& st) {
   st.X = RoundEven(Val(st.StX.str()), 3);
   st.Y = RoundEven(Val(st.StY.str()), 3);
   st.Z = RoundEven(Val(st.StZ.str()), 3);
+  st.hasZ = !TrimView(st.StZ.str()).empty();
+}
+
+// The known points the run used, each once, in the order of first use.
+void NoteControlPoint(RunState& st, std::string_view name) {
+  for (const SurveyPoint& point : st.survey.control) {
+    if (point.name == name) return;
+  }
+  SurveyPoint point{std::string(name), st.X, st.Y, std::nullopt};
+  if (st.hasZ && Ticked(st.fdc)) point.h = st.Z;
+  st.survey.control.push_back(std::move(point));
 }
 
 }  // namespace
@@ -70,11 +81,13 @@ void TimToaDoDiem(RunState& st) {
       const double x = RoundEven(Val(st.StX.str()), 3);
       const double y = RoundEven(Val(st.StY.str()), 3);
       if (std::fabs(st.X - x) > st.dscdh || std::fabs(st.Y - y) > st.dscdh) {
-        ReportError(st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kAtLine) +
-                            ReportNumber(first) + std::string(msg::kAnd) + ReportNumber(k + 1) +
-                            std::string(msg::kDifferentCoordinates) + std::string(msg::kDX) +
-                            ReportNumber(RoundEven(st.X - x, 2)) + std::string(msg::kDY) +
-                            ReportNumber(RoundEven(st.Y - y, 2)));
+        ReportError(st,
+                    std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kAtLine) +
+                        ReportNumber(first) + std::string(msg::kAnd) + ReportNumber(k + 1) +
+                        std::string(msg::kDifferentCoordinates) + std::string(msg::kDX) +
+                        ReportNumber(RoundEven(st.X - x, 2)) + std::string(msg::kDY) +
+                        ReportNumber(RoundEven(st.Y - y, 2)),
+                    st.TenKC.str());
       }
     } else {
       TakeCoordinates(st);
@@ -95,10 +108,12 @@ void TimToaDoDiem(RunState& st) {
     st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
     AppendControlLine(st);
   }
+  if (st.n != 0) NoteControlPoint(st, name);
   if (st.n == 0) {
     st.I = 0;
     ReportError(st,
-                std::string(msg::kPointColon) + st.TenKC.str() + std::string(msg::kNoCoordinates));
+                std::string(msg::kPointColon) + st.TenKC.str() + std::string(msg::kNoCoordinates),
+                st.TenKC.str());
   }
 }
 

@@ -20,9 +20,11 @@ base_src=$work/base-src
 . tools/ensure-packages.sh
 ensure_packages cmake ninja-build g++ libcli11-dev python3
 
+launcher=()
+if command -v ccache >/dev/null; then launcher=(-DCMAKE_CXX_COMPILER_LAUNCHER=ccache); fi
 build_cli() {  # source folder, build folder
   cmake -S "$1" -B "$2" -G Ninja -DCMAKE_BUILD_TYPE=Release -DKAVU_BUILD_TESTS=OFF \
-    -DKAVU_BUILD_BENCH=OFF -DKAVU_BUILD_UI=OFF >/dev/null
+    -DKAVU_BUILD_BENCH=OFF -DKAVU_BUILD_UI=OFF "${launcher[@]}" >/dev/null
   cmake --build "$2" --target kavu-cli >/dev/null
 }
 
