@@ -77,6 +77,9 @@ class TextOut {
     void operator()(std::FILE* file) const { std::fclose(file); }
   };
   std::unique_ptr<std::FILE, Closer> file_;
+  // Written to the file a block at a time.
+  bool Drain();
+  std::string buffer_;
   std::filesystem::path path_;
   bool failed_ = false;
 };

@@ -52,7 +52,7 @@ class WorkingCopy {
   void ReadLine() {
     st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
     st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
-    st_.MangTruong = SplitFields(st_.dong);
+    SplitFields(st_.dong, st_.MangTruong);
     st_.stp = static_cast<int>(st_.MangTruong.size());
   }
 

@@ -7,6 +7,8 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 #include "core/angles.h"
@@ -124,6 +126,19 @@ struct ComputationFields {
   std::vector<SketchRow> MangSoLieuSoDo;
   std::vector<PegEntry> MangCocPhu;
   std::string ChuoiKC;
+
+  // Lookup indexes of the tables above by trimmed name, brought up to date
+  // when a point is looked up: positions in MangKhongChe and
+  // MangToaDoChiTiet, the names of the lines of ChuoiKC, the names of
+  // survey.control.
+  struct NameIndex {
+    std::unordered_map<std::string, std::vector<std::size_t>> positions;
+    std::size_t done = 0;
+  };
+  NameIndex knownIndex, detailIndex;
+  std::unordered_set<std::string> chuoiKCNames;
+  std::size_t chuoiKCRead = 0;
+  std::unordered_set<std::string> controlNames;
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
   int sdtd() const { return static_cast<int>(MangToaDoChiTiet.size()); }

@@ -27,21 +27,44 @@ void AppendControlLine(RunState& st) {
 
 // Whether ChuoiKC already holds a line for the point: the name field of each
 // line (after "TR "), trimmed, is compared whole, so that "3" is not found in
-// the line of "1003".
-bool ChuoiKCHas(std::string_view chuoi, std::string_view name) {
+// the line of "1003". The lines added since the last lookup are read first.
+bool ChuoiKCHas(RunState& st, std::string_view name) {
   constexpr std::string_view kHead = "TR ";
   constexpr std::size_t kNameWidth = decltype(RunState::TenKC)::kWidth;
-  std::size_t start = 0;
+  const std::string_view chuoi = st.ChuoiKC;
+  if (st.chuoiKCRead > chuoi.size()) {
+    st.chuoiKCNames.clear();
+    st.chuoiKCRead = 0;
+  }
+  std::size_t start = st.chuoiKCRead;
   while (start < chuoi.size()) {
     std::size_t end = chuoi.find("\r\n", start);
-    if (end == std::string_view::npos) end = chuoi.size();
+    // A line not yet ended is read again with its end.
+    if (end == std::string_view::npos) break;
     const std::string_view line = chuoi.substr(start, end - start);
-    if (line.starts_with(kHead) && TrimView(line.substr(kHead.size(), kNameWidth)) == name) {
-      return true;
+    if (line.starts_with(kHead)) {
+      st.chuoiKCNames.emplace(TrimView(line.substr(kHead.size(), kNameWidth)));
     }
     start = end + 2;
   }
-  return false;
+  st.chuoiKCRead = start;
+  if (st.chuoiKCNames.contains(std::string(name))) return true;
+  // The unended last line, if any.
+  const std::string_view rest = chuoi.substr(start);
+  return rest.starts_with(kHead) && TrimView(rest.substr(kHead.size(), kNameWidth)) == name;
+}
+
+// The positions of name in a table whose rows start with a name, in order.
+template <typename Row>
+const std::vector<std::size_t>& Positions(const std::vector<Row>& table, RunState::NameIndex& index,
+                                          std::string_view name) {
+  if (index.done > table.size()) index = {};
+  for (; index.done < table.size(); ++index.done) {
+    index.positions[std::string(TrimView(table[index.done][0]))].push_back(index.done);
+  }
+  static const std::vector<std::size_t> kNone;
+  const auto found = index.positions.find(std::string(name));
+  return found == index.positions.end() ? kNone : found->second;
 }
 
 void TakeCoordinates(RunState& st) {
@@ -53,9 +76,7 @@ void TakeCoordinates(RunState& st) {
 
 // The known points the run used, each once, in the order of first use.
 void NoteControlPoint(RunState& st, std::string_view name) {
-  for (const SurveyPoint& point : st.survey.control) {
-    if (point.name == name) return;
-  }
+  if (!st.controlNames.emplace(name).second) return;
   SurveyPoint point{std::string(name), st.X, st.Y, std::nullopt};
   if (st.hasZ && Ticked(st.fdc)) point.h = st.Z;
   st.survey.control.push_back(std::move(point));
@@ -69,14 +90,14 @@ void TimToaDoDiem(RunState& st) {
   st.TenKC = Trim(st.TenKC.str());
   const std::string wanted = Trim(st.TenKC.str());
   const std::string_view name = wanted;
-  for (int k = 0; k < st.sdkc(); ++k) {
-    const KnownPoint& point = st.MangKhongChe[static_cast<std::size_t>(k)];
-    if (TrimView(point[0]) != name) continue;
+  for (const std::size_t position : Positions(st.MangKhongChe, st.knownIndex, name)) {
+    const int k = static_cast<int>(position);
+    const KnownPoint& point = st.MangKhongChe[position];
     ++st.n;
     st.StX = point[1];
     st.StY = point[2];
     st.StZ = point[3];
-    if (!ChuoiKCHas(st.ChuoiKC, name)) AppendControlLine(st);
+    if (!ChuoiKCHas(st, name)) AppendControlLine(st);
     if (st.n > 1) {
       const double x = RoundEven(Val(st.StX.str()), 3);
       const double y = RoundEven(Val(st.StY.str()), 3);
@@ -97,9 +118,12 @@ void TimToaDoDiem(RunState& st) {
   // A point computed earlier in the run, named "DKC" + its name.
   const bool computedPoint = name.starts_with("DKC");
   const std::string_view computedName = computedPoint ? name.substr(3) : std::string_view();
-  for (int k = 0; computedPoint && k < st.sdtd(); ++k) {
-    const DetailPoint& point = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
-    if (TrimView(point[0]) != computedName) continue;
+  // Copied: the rows below are added to the known points while it is read.
+  const std::vector<std::size_t> computed =
+      computedPoint ? Positions(st.MangToaDoChiTiet, st.detailIndex, computedName)
+                    : std::vector<std::size_t>();
+  for (const std::size_t position : computed) {
+    const DetailPoint& point = st.MangToaDoChiTiet[position];
     ++st.n;
     st.StX = point[1];
     st.StY = point[2];
