@@ -16,7 +16,7 @@
 
 #include "core/host.h"
 #include "core/messages.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
 

@@ -29,22 +29,25 @@
 
 namespace kavu {
 
+bool LineReader::Next(std::string_view& line) {
+  if (next_ >= content_.size()) return false;
+  const std::size_t start = next_;
+  const std::size_t end = content_.find_first_of("\r\n", start);
+  if (end == std::string_view::npos) {
+    line = content_.substr(start);
+    next_ = content_.size();
+    return true;
+  }
+  line = content_.substr(start, end - start);
+  next_ = end + 1;
+  if (content_[end] == '\r' && next_ < content_.size() && content_[next_] == '\n') ++next_;
+  return true;
+}
+
 std::vector<std::string> SplitLines(std::string_view content) {
   std::vector<std::string> lines;
-  std::size_t start = 0;
-  std::size_t i = 0;
-  while (i < content.size()) {
-    const char c = content[i];
-    if (c == '\r' || c == '\n') {
-      lines.emplace_back(content.substr(start, i - start));
-      ++i;
-      if (c == '\r' && i < content.size() && content[i] == '\n') ++i;
-      start = i;
-    } else {
-      ++i;
-    }
-  }
-  if (start < content.size()) lines.emplace_back(content.substr(start));
+  LineReader reader(content);
+  for (std::string_view line; reader.Next(line);) lines.emplace_back(line);
   return lines;
 }
 

@@ -1,4 +1,4 @@
-#include "products/lookup.h"
+#include "core/lookup.h"
 
 #include <cmath>
 

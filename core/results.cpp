@@ -1,4 +1,4 @@
-#include "products/results.h"
+#include "core/results.h"
 
 #include "core/angles.h"
 #include "core/numbers.h"

@@ -3,12 +3,12 @@
 #include <cmath>
 #include <string>
 
+#include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/results.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
-#include "products/lookup.h"
-#include "products/results.h"
 
 namespace kavu {
 namespace {

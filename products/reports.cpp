@@ -1,4 +1,4 @@
-#include "core/reports.h"
+#include "products/reports.h"
 
 #include <algorithm>
 #include <filesystem>

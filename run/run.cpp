@@ -1,22 +1,22 @@
-#include "core/run.h"
+#include "run/run.h"
 
 #include <algorithm>
 #include <ctime>
 #include <filesystem>
 #include <string>
 
+#include "core/control_points.h"
+#include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/paths.h"
-#include "core/reports.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
 #include "import/dispatch.h"
-#include "products/control_points.h"
 #include "products/dxf.h"
-#include "products/lookup.h"
 #include "products/pegs.h"
+#include "products/reports.h"
 #include "products/sketch.h"
 
 namespace kavu {
@@ -51,7 +51,8 @@ class WorkingCopy {
   bool AtEnd() const { return next_ >= st_.tamsl.size(); }
   void ReadLine() {
     st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
-    st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
+    // Each line is read once: it leaves the working copy.
+    st_.dong = AtEnd() ? std::string() : std::move(st_.tamsl[next_++]);
     SplitFields(st_.dong, st_.MangTruong);
     st_.stp = static_cast<int>(st_.MangTruong.size());
   }
@@ -267,14 +268,6 @@ void RemoveProduct(const RunState& st, const std::string& path) {
   std::filesystem::remove(PathFromUtf8(path), ignored);
 }
 
-// A station record that the station loop can reach: on any line but the last.
-bool HasStationRecord(const std::vector<std::string>& tamsl) {
-  if (tamsl.size() < 2) return false;
-  return std::any_of(tamsl.begin(), tamsl.end() - 1, [](const std::string& line) {
-    return line.starts_with("TR") && line.find(' ') != std::string::npos;
-  });
-}
-
 RunResult Finish(RunState& st, RunOutcome outcome) {
   RunResult result;
   result.outcome = outcome;
@@ -302,7 +295,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   const std::string startTime = TimeOfDay();
 
   FileLock jobLock;
-  const auto fieldBook = CheckAndConvert(st, host, &jobLock);
+  auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
 
   st.Tyle = st.TyleTXT;
@@ -322,10 +315,13 @@ RunResult tinh_Click(RunState& st, Host& host) {
     AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
+  // The working copy holds all the run reads of the field book from here on.
+  fieldBook.reset();
+  WritePegFileHead(st);
   st.ChuoiKC.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
-  if (!HasStationRecord(st.tamsl)) {
+  if (st.tamsl.empty()) {
     host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
     st.txtfile.clear();
     host.SetFileBox("");

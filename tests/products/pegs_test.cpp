@@ -3,7 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "core/host.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "tests/products/product_files.h"
 
 namespace kavu {

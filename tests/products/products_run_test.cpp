@@ -1,7 +1,7 @@
 #include <gtest/gtest.h>
 
 #include "core/host.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "core/tcvn3.h"
 #include "tests/products/product_files.h"
 
