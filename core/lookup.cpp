@@ -1,9 +1,11 @@
 #include "core/lookup.h"
 
 #include <cmath>
+#include <optional>
 
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -54,13 +56,15 @@ bool ChuoiKCHas(RunState& st, std::string_view name) {
   return rest.starts_with(kHead) && TrimView(rest.substr(kHead.size(), kNameWidth)) == name;
 }
 
-// The positions of name in a table whose rows start with a name, in order.
-template <typename Row>
+// The positions of name in a table, in order; nameOf gives a row's trimmed
+// name, or nothing for a row that is not looked up.
+template <typename Row, typename NameOf>
 const std::vector<std::size_t>& Positions(const std::vector<Row>& table, RunState::NameIndex& index,
-                                          std::string_view name) {
+                                          std::string_view name, NameOf nameOf) {
   if (index.done > table.size()) index = {};
   for (; index.done < table.size(); ++index.done) {
-    index.positions[std::string(TrimView(table[index.done][0]))].push_back(index.done);
+    const std::optional<std::string_view> key = nameOf(table[index.done]);
+    if (key) index.positions[std::string(*key)].push_back(index.done);
   }
   static const std::vector<std::size_t> kNone;
   const auto found = index.positions.find(std::string(name));
@@ -90,7 +94,10 @@ void TimToaDoDiem(RunState& st) {
   st.TenKC = Trim(st.TenKC.str());
   const std::string wanted = Trim(st.TenKC.str());
   const std::string_view name = wanted;
-  for (const std::size_t position : Positions(st.MangKhongChe, st.knownIndex, name)) {
+  const auto knownName = [](const KnownPoint& point) {
+    return std::optional<std::string_view>(TrimView(point[0]));
+  };
+  for (const std::size_t position : Positions(st.MangKhongChe, st.knownIndex, name, knownName)) {
     const int k = static_cast<int>(position);
     const KnownPoint& point = st.MangKhongChe[position];
     ++st.n;
@@ -118,16 +125,19 @@ void TimToaDoDiem(RunState& st) {
   // A point computed earlier in the run, named "DKC" + its name.
   const bool computedPoint = name.starts_with("DKC");
   const std::string_view computedName = computedPoint ? name.substr(3) : std::string_view();
-  // Copied: the rows below are added to the known points while it is read.
-  const std::vector<std::size_t> computed =
-      computedPoint ? Positions(st.MangToaDoChiTiet, st.detailIndex, computedName)
-                    : std::vector<std::size_t>();
+  const auto detailName = [](const ComputedPoint& point) {
+    return point.kind == PointKind::Detail ? std::optional<std::string_view>(point.name)
+                                           : std::nullopt;
+  };
+  static const std::vector<std::size_t> kNone;
+  const std::vector<std::size_t>& computed =
+      computedPoint ? Positions(st.survey.points, st.detailIndex, computedName, detailName) : kNone;
   for (const std::size_t position : computed) {
-    const DetailPoint& point = st.MangToaDoChiTiet[position];
+    const ComputedPoint& point = st.survey.points[position];
     ++st.n;
-    st.StX = point[1];
-    st.StY = point[2];
-    st.StZ = point[3];
+    st.StX = NorthingText(point.x);
+    st.StY = EastingText(point.y);
+    st.StZ = HeightText(point.z);
     if (st.n == 1) TakeCoordinates(st);
     st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
     AppendControlLine(st);

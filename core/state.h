@@ -62,8 +62,6 @@ struct FileSelection {
 
 // A known point: name, X, Y, H as texts.
 using KnownPoint = std::array<std::string, 4>;
-// A computed point: name (12), X, Y, H, code, note.
-using DetailPoint = std::array<std::string, 6>;
 // A field-sketch row: name, horizontal angle, distance, vertical angle, prism
 // height, note.
 using SketchRow = std::array<std::string, 6>;
@@ -120,7 +118,6 @@ struct ComputationFields {
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;
-  std::vector<DetailPoint> MangToaDoChiTiet;
   std::vector<std::string> MangSoLieuASC;
   std::vector<std::string> MangSoLieuToaDo;
   std::vector<SketchRow> MangSoLieuSoDo;
@@ -129,7 +126,7 @@ struct ComputationFields {
 
   // Lookup indexes of the tables above by trimmed name, brought up to date
   // when a point is looked up: positions in MangKhongChe and
-  // MangToaDoChiTiet, the names of the lines of ChuoiKC, the names of
+  // survey.points, the names of the lines of ChuoiKC, the names of
   // survey.control.
   struct NameIndex {
     std::unordered_map<std::string, std::vector<std::size_t>> positions;
@@ -141,7 +138,6 @@ struct ComputationFields {
   std::unordered_set<std::string> controlNames;
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
-  int sdtd() const { return static_cast<int>(MangToaDoChiTiet.size()); }
   int sdasc() const { return static_cast<int>(MangSoLieuASC.size()); }
   int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
   int sdcp() const { return static_cast<int>(MangCocPhu.size()); }

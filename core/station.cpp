@@ -113,6 +113,7 @@ void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string 
   point.x = st.xi;
   point.y = st.yi;
   if (Ticked(st.fdc)) point.h = Val(st.StZ.str());
+  point.z = st.zi;
   point.code = std::move(code);
   point.note = std::move(note);
   point.kind = kind;
@@ -155,6 +156,10 @@ void GocString(RunState& st) {
   st.giay = parts.giay;
 }
 
+std::string NorthingText(double x) { return Mask(x, "#######.000"); }
+std::string EastingText(double y) { return Mask(y, "######.000"); }
+std::string HeightText(double z) { return Mask(z, "######.000"); }
+
 void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
 
 void TinhDoCao(RunState& st) {
@@ -165,7 +170,7 @@ void TinhDoCao(RunState& st) {
   st.rad = st.goc * kPi / 180;
   st.dz = std::tan(st.rad) * st.s;
   st.zi = st.zTR + st.dz + Val(st.ccm) - st.ccg;
-  st.StZ = Mask(st.zi, "######.000");
+  st.StZ = HeightText(st.zi);
 }
 
 void TinhToaDo(RunState& st) {
@@ -181,8 +186,8 @@ void TinhToaDo(RunState& st) {
   st.xi = RoundEven(st.xTR + st.dx, 3);
   st.yi = RoundEven(st.yTR + st.dy, 3);
   st.s = RoundEven(st.s, 3);
-  st.StX = Mask(st.xi, "#######.000");
-  st.StY = Mask(st.yi, "######.000");
+  st.StX = NorthingText(st.xi);
+  st.StY = EastingText(st.yi);
   st.StS = Mask(st.s, "#####.000");
 }
 
@@ -210,9 +215,8 @@ void STP5(RunState& st) {
   TinhDoCao(st);
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
-  GhiMangToaDoChiTiet(st);
-  NotePoint(st, PointKind::Detail, st.TenDiem.str(), st.MangToaDoChiTiet.back()[4],
-            st.MangToaDoChiTiet.back()[5]);
+  auto [code, note] = CodeAndNote(st);
+  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note));
   GhiMangSoLieuToaDo(st);
   GhiMangSoLieuVaoSoDo(st);
 }

@@ -7,6 +7,7 @@
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/paths.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -20,11 +21,11 @@ void WriteStationListingHeader(TextOut& out) {
   for (std::string_view line : msg::kCpvHeader) out.Line(line);
 }
 
-std::string CoordinateTextLine(const RunState& st, int k, int decimals) {
-  const DetailPoint& p = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
-  const std::string height = NumberColumn(NumberText(RoundEven(Val(p[3]), decimals)), 10);
-  return FixedWidth(p[0].substr(0, 5), 5) + " " + NumberWidth(p[1], 11) + " " +
-         NumberWidth(p[2], 10) + " " + height + " " + p[4] + " " + p[5];
+std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {
+  const std::string height =
+      NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
+  return FixedWidth(p.name, 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
+         NumberWidth(EastingText(p.y), 10) + " " + height + " " + p.code + " " + p.note;
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {
@@ -78,7 +79,9 @@ void WriteTextProducts(RunState& st) {
   if (Ticked(st.ftd)) {
     const int decimals = HeightDecimals(st.txtSoleDC);
     WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
-      for (int k = 0; k < st.sdtd(); ++k) out.Line(CoordinateTextLine(st, k, decimals));
+      for (const ComputedPoint& point : st.survey.points) {
+        if (point.kind == PointKind::Detail) out.Line(CoordinateTextLine(point, decimals));
+      }
     });
   }
 }

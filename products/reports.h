@@ -18,7 +18,7 @@ bool ProductOverInput(RunState& st, const std::string& path);
 // its .td1, the .txt. Unwritable ones are added to st.unwritable.
 void WriteTextProducts(RunState& st);
 
-// A line of the coordinate text file for computed point k (from 0).
-std::string CoordinateTextLine(const RunState& st, int k, int decimals);
+// A line of the coordinate text file for a computed detail point.
+std::string CoordinateTextLine(const ComputedPoint& point, int decimals);
 
 }  // namespace kavu

@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "core/host.h"
+#include "core/station.h"
 #include "run/run.h"
 #include "tests/products/product_files.h"
 
@@ -130,7 +131,8 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
                       "3 1800000 20 900000 1.5\r\n");
   QuietHost host;
   RunState first = RunOn(book);
-  ASSERT_EQ(tinh_Click(first, host).outcome, RunOutcome::Completed);
+  const RunResult firstRun = tinh_Click(first, host);
+  ASSERT_EQ(firstRun.outcome, RunOutcome::Completed);
   ASSERT_EQ(first.err, 0);
   ASSERT_EQ(first.sdkc(), 3);  // ST1, DH1 and the peg CP5
   const KnownPoint peg = first.MangKhongChe[2];
@@ -149,10 +151,13 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   RunState second = RunOn(again);
   second.ckKC = 1;
   second.txtFKC = (folder / "JOB1.cp").string();
-  ASSERT_EQ(tinh_Click(second, host).outcome, RunOutcome::Completed);
+  const RunResult secondRun = tinh_Click(second, host);
+  ASSERT_EQ(secondRun.outcome, RunOutcome::Completed);
   EXPECT_EQ(second.err, 0);
-  ASSERT_EQ(second.sdtd(), 1);
-  EXPECT_EQ(second.MangToaDoChiTiet[0], first.MangToaDoChiTiet[0]);
+  ASSERT_EQ(secondRun.survey.points.size(), 1u);
+  EXPECT_EQ(secondRun.survey.points[0].x, firstRun.survey.points[0].x);
+  EXPECT_EQ(secondRun.survey.points[0].y, firstRun.survey.points[0].y);
+  EXPECT_EQ(secondRun.survey.points[0].z, firstRun.survey.points[0].z);
 
   // As a field book: the peg comes back as a detail point at its place. The
   // block's station line carries no instrument height, which the run reports,
@@ -160,14 +165,15 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   const auto asBook = folder / "JOB3.asc";
   testing::WriteBytes(asBook, cp);
   RunState third = RunOn(asBook);
-  ASSERT_EQ(tinh_Click(third, host).outcome, RunOutcome::Completed);
+  const RunResult thirdRun = tinh_Click(third, host);
+  ASSERT_EQ(thirdRun.outcome, RunOutcome::Completed);
   EXPECT_EQ(third.err, 1);
-  ASSERT_EQ(third.sdtd(), 1);
-  const DetailPoint& point = third.MangToaDoChiTiet[0];
-  EXPECT_EQ(Trim(point[0]), "CP5");
-  EXPECT_EQ(point[1], peg[1]);
-  EXPECT_EQ(point[2], peg[2]);
-  EXPECT_EQ(point[3], "11.000    ");
+  ASSERT_EQ(thirdRun.survey.points.size(), 1u);
+  const ComputedPoint& point = thirdRun.survey.points[0];
+  EXPECT_EQ(point.name, "CP5");
+  EXPECT_EQ(NorthingText(point.x), Trim(peg[1]));
+  EXPECT_EQ(EastingText(point.y), Trim(peg[2]));
+  EXPECT_EQ(HeightText(point.z), "11.000");
   EXPECT_EQ(peg[3], "12.450    ");
 }
 
