@@ -9,10 +9,10 @@
 namespace kavu {
 
 // Exit codes.
-inline constexpr int kExitOk = 0;          // completed without data errors
-inline constexpr int kExitDataErrors = 1;  // data errors or an unwritable product
-inline constexpr int kExitStopped = 2;     // did not start or stopped early
-inline constexpr int kExitUsage = 64;      // bad usage
+inline constexpr int kExitOk = 0;             // completed without data errors
+inline constexpr int kExitDataErrors = 1;     // data errors or an unwritable product
+inline constexpr int kExitStopped = 2;        // did not start or stopped early
+inline constexpr int kExitUsage = 64;         // bad usage
 inline constexpr int kExitInterrupted = 130;  // stopped by Ctrl+C: nothing written
 
 // args excludes the program name. Progress goes to err only when
