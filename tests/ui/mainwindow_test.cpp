@@ -15,7 +15,6 @@
 #include <functional>
 #include <map>
 
-#include "core/lines.h"
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "support.h"
