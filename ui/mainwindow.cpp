@@ -648,6 +648,7 @@ void MainWindow::buildRunControls() {
 
 RunResult MainWindow::computeOffThread() {
   running_ = true;
+  const QPointer<QWidget> focused = focusWidget();
   // Only the stop button takes input (Esc presses it); the choices the run
   // has read stay as they are until its end.
   std::vector<QPointer<QWidget>> locked;
@@ -678,7 +679,11 @@ RunResult MainWindow::computeOffThread() {
     if (control) control->setEnabled(true);
   }
   running_ = false;
-  if (std::exchange(focusFileBoxAfterRun_, false)) FocusFileBox();
+  if (std::exchange(focusFileBoxAfterRun_, false)) {
+    FocusFileBox();
+  } else if (focused) {
+    focused->setFocus();
+  }
   return result;
 }
 
