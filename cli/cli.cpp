@@ -49,7 +49,9 @@ Exit status:
   1   the run completed with data errors (see NAME.err), or a product could
       not be written
   2   the run did not start or stopped early (the message is on stderr)
-  64  bad usage)";
+  64  bad usage
+  130 stopped by Ctrl+C: no product was written, the earlier ones are kept
+      (a second Ctrl+C ends the command at once))";
 
 // The seven header texts: option, meaning, default (the header form's).
 struct HeaderOption {
@@ -72,7 +74,8 @@ constexpr std::array<HeaderOption, 7> kHeaderOptions{{
 // not shown (the command prints the summary itself).
 class BatchHost : public Host {
  public:
-  BatchHost(std::ostream& err, bool errIsTerminal) : err_(err), terminal_(errIsTerminal) {}
+  BatchHost(std::ostream& err, bool errIsTerminal, const std::atomic<bool>* interrupted)
+      : err_(err), terminal_(errIsTerminal), interrupted_(interrupted) {}
 
   MsgAnswer MessageBox(std::string_view text, MsgIcon, MsgButtons buttons) override {
     const bool summary = buttons == MsgButtons::YesNo && text.starts_with(msg::kTotalStations);
@@ -97,6 +100,7 @@ class BatchHost : public Host {
   void SetFileBox(std::string_view) override {}
   void FocusFileBox() override {}
   void SelectKind(int) override {}
+  bool Cancelled() override { return interrupted_ != nullptr && interrupted_->load(); }
 
   void ClearProgress() {
     if (!progressShown_) return;
@@ -115,6 +119,7 @@ class BatchHost : public Host {
 
   std::ostream& err_;
   bool terminal_;
+  const std::atomic<bool>* interrupted_;
   bool progressShown_ = false;
 };
 
@@ -166,7 +171,7 @@ int Usage(std::ostream& err, std::string_view what) {
 }  // namespace
 
 int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostream& err,
-           bool errIsTerminal) {
+           bool errIsTerminal, const std::atomic<bool>* interrupted) {
   Settings set;
   for (std::size_t i = 0; i < kHeaderOptions.size(); ++i) {
     set.header[i] = kHeaderOptions[i].fallback;
@@ -275,7 +280,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   st.seed = seed;
   for (std::size_t i = 0; i < set.header.size(); ++i) st.nhapsdo[i] = Utf8ToTcvn3(set.header[i]);
 
-  BatchHost host(err, errIsTerminal);
+  BatchHost host(err, errIsTerminal, interrupted);
   RunResult result;
   try {
     result = tinh_Click(st, host);
@@ -285,6 +290,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
     return kExitStopped;
   }
   host.ClearProgress();
+  if (result.outcome == RunOutcome::Cancelled) return kExitInterrupted;
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
 
   for (const std::string& line : SummaryLines(result)) out << line << '\n';

@@ -17,11 +17,13 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QMimeData>
+#include <QProgressBar>
 #include <QPushButton>
 #include <QTextBrowser>
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
+#include <utility>
 
 #include "core/messages.h"
 #include "core/tcvn3.h"
@@ -29,6 +31,7 @@
 #include "ui/editor.h"
 #include "ui/lists.h"
 #include "ui/nhapsdo.h"
+#include "ui/runthread.h"
 #include "ui/settings.h"
 #include "ui/texts.h"
 #include "ui/timthay.h"
@@ -256,6 +259,7 @@ void MainWindow::buildControls() {
   grid->addLayout(buttons, 4, 0, 1, 3);
   grid->setColumnStretch(0, 1);
   grid->setColumnStretch(1, 1);
+  buildRunControls();
   resize(760, 520);
 
   connect(cbkieu_, &QComboBox::activated, this, &MainWindow::cbkieu_Click);
@@ -368,7 +372,8 @@ void MainWindow::lsttm_Change(const QString& path) {
 }
 
 void MainWindow::lstfile_Click(QListWidgetItem* item) {
-  if (item == nullptr) return;
+  // The run's file stays chosen until its end, whatever the list shows.
+  if (item == nullptr || running_) return;
   const QString path = QDir::toNativeSeparators(QDir(lstfile_->path()).filePath(item->text()));
   DeriveFileSelection(st_, Std(path));
   txtfile_->setText(Q(st_.filesl));
@@ -377,7 +382,7 @@ void MainWindow::lstfile_Click(QListWidgetItem* item) {
 
 bool MainWindow::chooseFile(const QString& path) {
   const QFileInfo info(path);
-  if (!info.isFile()) return false;
+  if (!info.isFile() || running_) return false;
   const int kind = KindOfExtension(Std(info.suffix().toUpper()));
   if (!QDir::match(lstfile_->pattern(), info.fileName())) setKind(kind);
   if (lsttm_->setPath(info.absolutePath())) {
@@ -417,6 +422,7 @@ void MainWindow::takeTypedFile() {
 }
 
 void MainWindow::dragEnterEvent(QDragEnterEvent* event) {
+  if (running_) return;
   for (const QUrl& url : event->mimeData()->urls()) {
     if (url.isLocalFile() && QFileInfo(url.toLocalFile()).isFile()) {
       event->acceptProposedAction();
@@ -465,12 +471,8 @@ void MainWindow::collectWindowFields() {
 void MainWindow::tinh_Click() {
   if (running_ || ending_) return;
   takeTypedFile();
-  running_ = true;
   collectWindowFields();
-  QApplication::setOverrideCursor(Qt::WaitCursor);
-  lastRun_ = kavu::tinh_Click(st_, *this);
-  QApplication::restoreOverrideCursor();
-  running_ = false;
+  lastRun_ = computeOffThread();
   if (lastRun_.outcome == RunOutcome::Completed && lastRun_.answer == MsgAnswer::No) {
     // No to "continue?" ends the program; the session's choices are kept.
     if (!editsSettled()) return;
@@ -538,6 +540,7 @@ void MainWindow::trogiup_Click() {
 }
 
 void MainWindow::thoat_Click() {
+  if (running_) return;
   Beep();
   tbao_ = ask_(Q(kExitQuestion), MsgIcon::Question, MsgButtons::YesNo);
   if (tbao_ != MsgAnswer::Yes || !editsSettled()) return;
@@ -589,17 +592,20 @@ MsgAnswer MainWindow::MessageBox(std::string_view text, MsgIcon icon, MsgButtons
   return tbao_;
 }
 
-void MainWindow::SetTitle(std::string_view title) {
-  setWindowTitle(Q(title));
-  // Let the title show during the run; the user's input waits for its end.
-  QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
-}
+void MainWindow::SetTitle(std::string_view title) { setWindowTitle(Q(title)); }
 
 void MainWindow::Beep() { QApplication::beep(); }
 
 void MainWindow::SetFileBox(std::string_view text) { txtfile_->setText(Q(text)); }
 
-void MainWindow::FocusFileBox() { txtfile_->setFocus(); }
+void MainWindow::FocusFileBox() {
+  // The box is locked while the run works: it takes the focus at the end.
+  if (running_) {
+    focusFileBoxAfterRun_ = true;
+    return;
+  }
+  txtfile_->setFocus();
+}
 
 void MainWindow::SelectKind(int index) { setKind(index); }
 
@@ -618,6 +624,73 @@ void MainWindow::ShowFolder(std::string_view folder, std::string_view pattern) {
   lsttm_->setPath(clean);
   lstfile_->setPattern(Q(pattern));  // lists the new products too
   txttm_->setText(ShortFolderText(lsttm_->path()));
+}
+
+void MainWindow::buildRunControls() {
+  runner_ = new RunThread(*this, this);
+  tiendo_ = new QProgressBar(this);
+  tiendo_->setObjectName(QStringLiteral("tiendo"));
+  dung_ = MakeButton(this, "dung", Q(kStopRun));
+  auto* row = new QHBoxLayout;
+  row->addWidget(tiendo_, 1);
+  row->addWidget(dung_);
+  auto* grid = static_cast<QGridLayout*>(layout());
+  grid->addLayout(row, grid->rowCount(), 0, 1, grid->columnCount());
+  tiendo_->hide();
+  dung_->hide();
+  connect(dung_, &QPushButton::clicked, this, &MainWindow::dung_Click);
+  connect(runner_, &RunThread::progressed, tiendo_, [this](long long done, long long total) {
+    // The bar counts in thousandths: a working copy may exceed its int range.
+    tiendo_->setRange(0, 1000);
+    tiendo_->setValue(total > 0 ? static_cast<int>(done * 1000 / total) : 0);
+  });
+}
+
+RunResult MainWindow::computeOffThread() {
+  running_ = true;
+  const QPointer<QWidget> focused = focusWidget();
+  // Only the stop button takes input (Esc presses it); the choices the run
+  // has read stay as they are until its end.
+  std::vector<QPointer<QWidget>> locked;
+  for (QWidget* control : findChildren<QWidget*>(Qt::FindDirectChildrenOnly)) {
+    if (control == dung_ || control == tiendo_ || qobject_cast<QLabel*>(control) != nullptr ||
+        !control->isEnabled()) {
+      continue;
+    }
+    control->setEnabled(false);
+    locked.emplace_back(control);
+  }
+  auto* thoat = findChild<QPushButton*>(QStringLiteral("thoat"));
+  setCancelButton(dung_);
+  tiendo_->setRange(0, 0);  // busy until the station loop reports
+  tiendo_->show();
+  dung_->setEnabled(true);
+  dung_->show();
+  dung_->setFocus();
+  QApplication::setOverrideCursor(Qt::BusyCursor);
+
+  RunResult result = runner_->run(st_);
+
+  QApplication::restoreOverrideCursor();
+  tiendo_->hide();
+  dung_->hide();
+  setCancelButton(thoat);
+  for (const QPointer<QWidget>& control : locked) {
+    if (control) control->setEnabled(true);
+  }
+  running_ = false;
+  if (std::exchange(focusFileBoxAfterRun_, false)) {
+    FocusFileBox();
+  } else if (focused) {
+    focused->setFocus();
+  }
+  return result;
+}
+
+void MainWindow::dung_Click() {
+  if (!running_) return;
+  runner_->cancel();
+  dung_->setEnabled(false);  // once is enough
 }
 
 }  // namespace kavu::ui
