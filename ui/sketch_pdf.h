@@ -1,0 +1,32 @@
+// The field sketch on paper: the pages of the .sdo file, A4, in a monospaced
+// font that has every Vietnamese letter, for a PDF file and for a printer.
+#pragma once
+
+#include <QString>
+#include <QStringList>
+#include <string>
+#include <vector>
+
+class QPagedPaintDevice;
+
+namespace kavu::ui {
+
+// The font of the sketch pages, named so that every system takes the same one.
+inline constexpr const char* kSketchFont = "DejaVu Sans Mono";
+
+// The sketch text laid on pages of at most linesPerPage lines: each station
+// starts a page; a station longer than a page goes on with the form's column
+// heads repeated.
+std::vector<QStringList> SketchPages(const QString& sketch, int linesPerPage);
+
+// The .sdo file (TCVN3) as text; empty when it cannot be read.
+QString ReadSketch(const std::string& utf8Path);
+
+// The pages painted on a PDF writer or a printer, A4 portrait; false when the
+// device could not be painted on.
+bool PaintSketch(QPagedPaintDevice& device, const QString& sketch);
+
+// Written whole or not at all; false when the file could not be written.
+bool SaveSketchPdf(const QString& sketch, const QString& path);
+
+}  // namespace kavu::ui
