@@ -17,7 +17,7 @@
 #include "core/run.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
-#ifdef KAVU_PICTURES
+#ifdef KAVU_CLI_PICTURES
 #include "cli/pictures.h"
 #endif
 
@@ -247,7 +247,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   }
 
   const bool pictures = !set.png.empty() || !set.svg.empty() || !set.pdf.empty();
-#ifndef KAVU_PICTURES
+#ifndef KAVU_CLI_PICTURES
   if (pictures) return Usage(err, "--png, --svg and --pdf: this kavu-cli was built without Qt");
 #endif
 
@@ -283,7 +283,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   }
   host.ClearProgress();
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
-#ifdef KAVU_PICTURES
+#ifdef KAVU_CLI_PICTURES
   if (pictures) {
     for (std::string& path : WritePictures(st, {set.png, set.svg, set.pdf})) {
       result.unwritable.push_back(std::move(path));

@@ -14,6 +14,7 @@
 #include "ui/ask.h"
 #include "ui/dialog.h"
 
+class QBoxLayout;
 class QCheckBox;
 class QComboBox;
 class QLabel;
@@ -27,6 +28,7 @@ namespace kavu::ui {
 class DriveList;
 class FileList;
 class FolderList;
+class MapWindow;
 class Nhapsdo;
 class Suasl;
 class Timthay;
@@ -85,6 +87,9 @@ class MainWindow : public Window, public Host {
   void suasolieu_Click();
   void trogiup_Click();
   void thoat_Click();
+  // Shows the last completed run on the map.
+  void bando_Click();
+  MapWindow& mapWindow();
 
   // Host: what the computation run asks of the window.
   MsgAnswer MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) override;
@@ -115,6 +120,9 @@ class MainWindow : public Window, public Host {
   void takeTypedFile();
   void remember(const QString& path);
   void fillRecentMenu();
+  // The map button beside the compute button and the "open after a run" box.
+  void buildMapControls(QBoxLayout* buttons);
+  void afterRun();
 
   RunState st_;
   RunResult lastRun_;
@@ -148,6 +156,10 @@ class MainWindow : public Window, public Host {
   std::unique_ptr<Suasl> suasl_;
   std::unique_ptr<Window> help_;
   QPointer<Nhapsdo> nhapsdo_;
+  QPushButton* bando_ = nullptr;
+  QCheckBox* ckBando_ = nullptr;
+  std::unique_ptr<MapWindow> map_;
+  bool mapStale_ = false;  // a run completed since the map was drawn
 };
 
 }  // namespace kavu::ui

@@ -211,7 +211,9 @@ void PaintMap(QPainter& painter, const MapModel& model, const MapView& view) {
         case MapKind::Peg:
           painter.setPen(QPen(colour, 1.5));
           painter.drawRect(QRectF(at - QPointF(3.5, 3.5), QSizeF(7, 7)));
-          if (labels || item.flagged) PaintLabel(painter, at, item.name, colour);
+          if ((labels || item.flagged) && !controlNames.contains(item.name)) {
+            PaintLabel(painter, at, item.name, colour);
+          }
           break;
         case MapKind::Control: {
           QPolygonF triangle;
@@ -269,6 +271,7 @@ bool SaveMapSvg(const MapModel& model, const MapView& view, const QString& path)
   svg.setOutputDevice(&file);
   svg.setSize(view.size);
   svg.setViewBox(QRect(QPoint(0, 0), view.size));
+  svg.setResolution(96);  // a pixel as a browser counts it
   svg.setTitle(QStringLiteral("kavu"));
   QPainter painter;
   if (!painter.begin(&svg)) return false;
