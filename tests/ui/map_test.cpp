@@ -238,6 +238,33 @@ class MapTest : public QObject {
     }
   }
 
+  // A field book with known errors, through the run and its error report:
+  // the points the report names are red, a click shows the report's line.
+  void aRunWithErrorsShowsThemInRed() {
+    Desk desk;
+    desk.write("e.asc",
+               "TR DC01 1000.000 2000.000 10.000\r\nTR DC02 1100.000 2000.000 10.000\r\n"
+               "TR DC01 1.50\r\nDKD DC02\r\n1 0900000 50.000 0900000 1.50\r\n"
+               "2 1807500 25.000 0900000 1.50 N\r\n3 0450000 30.000 0900000 1.50\r\n"
+               "3 0457000 30.000 0900000 1.50\r\n");
+    QVERIFY(desk.w.chooseFile(desk.path("e.asc")));
+    desk.w.tinh_Click();
+    QVERIFY(!desk.w.mapWindow().isVisible());  // not ticked: the button opens it
+    desk.w.bando_Click();
+    MapWindow& map = desk.w.mapWindow();
+    QVERIFY(map.isVisible());
+    QStringList red, plain;
+    for (const MapItem& item : map.canvas().model().items) {
+      (item.flagged ? red : plain) << item.name + QLatin1Char('@') + QString::number(item.line);
+    }
+    QCOMPARE(red, QStringList({"2@6", "3@7", "3@8"}));
+    QCOMPARE(plain, QStringList({"DC01@0", "DC02@0", "DC01@3", "1@5"}));
+    const std::size_t two = 4;  // two control points, the station, the points 1 and 2
+    QVERIFY(map.describe(two).contains(QStringLiteral("nhap sai phan phut")));
+    QVERIFY2(map.describe(two).contains(QStringLiteral("2 1807500 25.000 0900000 1.50 N")),
+             qPrintable(map.describe(two)));
+  }
+
   void theOpenAfterARunBoxIsKept() {
     {
       Desk desk;
