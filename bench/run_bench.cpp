@@ -51,6 +51,7 @@ void BM_ComputationRun(benchmark::State& state) {
   {
     kavu::TextOut out(file);
     out.Write(FieldBook(stations, points));
+    out.commit();
   }
   kavu::QuietHost host;
   for (auto _ : state) {

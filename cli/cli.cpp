@@ -6,10 +6,12 @@
 #include <CLI/CLI.hpp>
 #include <array>
 #include <charconv>
+#include <cmath>
 #include <cstdint>
 #include <exception>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "core/host.h"
@@ -136,6 +138,18 @@ std::optional<std::uint64_t> ParseSeed(std::string_view text) {
   return value;
 }
 
+// A number typed in full: the whole text is a finite decimal number.
+std::optional<double> ParseNumber(std::string_view text) {
+  if (text.starts_with('+')) text.remove_prefix(1);
+  double value = 0;
+  const auto [end, ec] = std::from_chars(text.data(), text.data() + text.size(), value);
+  if (ec != std::errc{} || end != text.data() + text.size() || text.empty() ||
+      !std::isfinite(value)) {
+    return std::nullopt;
+  }
+  return value;
+}
+
 // The command line's settings, before they are turned into window fields.
 struct Settings {
   std::string file;
@@ -186,13 +200,13 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
       ->type_name("auto|0..9");
   app.add_option("--scale", set.scale,
                  "map scale denominator: sets the distance tolerance (default: 1000)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
   app.add_option("--text-height", set.textHeight,
                  "label height in mm in the drawing file (default: 2.0)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
   app.add_option("--height-decimals", set.heightDecimals,
                  "decimals of the heights in the coordinate text file (default: 2)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
 
   app.add_flag("--asc", set.asc, "write the regenerated field book and its companion file");
   app.add_flag("--txt", set.txt, "write the coordinate text file");
@@ -239,6 +253,14 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
 
   const std::optional<int> kind = ParseKind(set.kind);
   if (!kind) return Usage(err, "--kind: expected auto or a number from 0 to 9, got: " + set.kind);
+  const std::optional<double> scale = ParseNumber(set.scale);
+  if (!scale || *scale <= 0)
+    return Usage(err, "--scale: expected a positive number, got: " + set.scale);
+  for (const auto& [option, text] : {std::pair{"--text-height", &set.textHeight},
+                                     std::pair{"--height-decimals", &set.heightDecimals}}) {
+    if (!ParseNumber(*text))
+      return Usage(err, std::string(option) + ": expected a number, got: " + *text);
+  }
   std::optional<std::uint64_t> seed;
   if (!set.seed.empty() || app.count("--seed") > 0) {
     seed = ParseSeed(set.seed);

@@ -5,6 +5,8 @@
 #include <cstdio>
 #include <optional>
 
+#include "core/lines.h"
+#include "core/messages.h"
 #include "ui/map_model.h"
 #include "ui/sketch_pdf.h"
 #include "ui/survey_of.h"
@@ -33,17 +35,28 @@ std::vector<std::string> WritePictures(const RunState& st, const PictureFiles& f
 
   std::vector<std::string> failed;
   const auto path = [](const std::string& utf8) { return QString::fromStdString(utf8); };
+  // A picture never replaces a file the run reads.
+  const auto overInput = [&](const std::string& picture) {
+    for (const std::string& input : st.inputs) {
+      if (!WouldReplace(picture, input)) continue;
+      failed.push_back(picture + std::string(msg::kProductIsInput));
+      return true;
+    }
+    return false;
+  };
   if (!files.png.empty() || !files.svg.empty()) {
     const ui::MapModel model = ui::BuildMap(SurveyOf(st));
     const ui::MapView view = ui::FitView(model, ui::kWholeSurveySize);
-    if (!files.png.empty() && !ui::SaveMapPng(model, view, path(files.png))) {
+    if (!files.png.empty() && !overInput(files.png) &&
+        !ui::SaveMapPng(model, view, path(files.png))) {
       failed.push_back(files.png);
     }
-    if (!files.svg.empty() && !ui::SaveMapSvg(model, view, path(files.svg))) {
+    if (!files.svg.empty() && !overInput(files.svg) &&
+        !ui::SaveMapSvg(model, view, path(files.svg))) {
       failed.push_back(files.svg);
     }
   }
-  if (!files.pdf.empty() &&
+  if (!files.pdf.empty() && !overInput(files.pdf) &&
       !ui::SaveSketchPdf(ui::ReadSketch(st.daufile + ".sdo"), path(files.pdf))) {
     failed.push_back(files.pdf);
   }

@@ -52,6 +52,13 @@ TEST(CliPictures, TheExampleAsPngSvgAndSketchPdf) {
   const std::string nowhere = (dir / "no" / "map.png").string();
   EXPECT_EQ(Cli({(dir / "job1.asc").string(), "--png", nowhere}, out, err), kExitDataErrors);
   EXPECT_NE(out.find(std::string(msg::kCannotWrite) + nowhere), std::string::npos) << out;
+  // Nor does it replace the field book.
+  const std::string book = (dir / "job1.asc").string();
+  EXPECT_EQ(Cli({book, "--pdf", book}, out, err), kExitDataErrors);
+  EXPECT_NE(out.find(std::string(msg::kCannotWrite) + book + std::string(msg::kProductIsInput)),
+            std::string::npos)
+      << out;
+  EXPECT_EQ(FileBytes(book), FileBytes(fs::path(KAVU_EXAMPLES) / "job1.asc"));
 }
 
 #else
