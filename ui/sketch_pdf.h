@@ -11,8 +11,10 @@ class QPagedPaintDevice;
 
 namespace kavu::ui {
 
-// The font of the sketch pages, named so that every system takes the same one.
-inline constexpr const char* kSketchFont = "DejaVu Sans Mono";
+// The font of the sketch pages (Debian package fonts-noto-mono), named so that
+// every system takes the same one: DejaVu Sans Mono lacks half of the
+// Vietnamese letters with two marks (ả, ề, ố...).
+inline constexpr const char* kSketchFont = "Noto Mono";
 
 // The sketch text laid on pages of at most linesPerPage lines: each station
 // starts a page; a station longer than a page goes on with the form's column

@@ -2,10 +2,12 @@
 // on the screen and in the pictures, a click showing the error lines and the
 // record; the exports read back; the field sketch on pages and in a PDF.
 #include <QCheckBox>
+#include <QFontInfo>
 #include <QImage>
 #include <QPainter>
 #include <QProcess>
 #include <QPushButton>
+#include <QRawFont>
 #include <QStandardPaths>
 #include <QSvgRenderer>
 #include <QtTest>
@@ -183,6 +185,19 @@ class MapTest : public QObject {
     QCOMPARE(pages[1].back(), QString(77, QLatin1Char('=')));
     QVERIFY(pages[2][0].startsWith(QStringLiteral("Lược đồ số:")));
     QVERIFY(pages[2][2].endsWith(QStringLiteral("DC02")));
+  }
+
+  // The sketch's font is there and draws every letter of TCVN3 itself, so
+  // that no letter comes from another font of another width.
+  void theSketchFontHasEveryVietnameseLetter() {
+    const QFont font(QString::fromLatin1(kSketchFont));
+    QCOMPARE(QFontInfo(font).family(), QString::fromLatin1(kSketchFont));
+    const QRawFont raw = QRawFont::fromFont(font);
+    std::string bytes;
+    for (int b = 0x80; b <= 0xFF; ++b) bytes += static_cast<char>(b);
+    for (const QChar c : QString::fromStdString(Tcvn3ToUtf8(bytes))) {
+      if (c.isLetter()) QVERIFY2(raw.supportsCharacter(c), qPrintable(QString(c)));
+    }
   }
 
   // The README's example computed from the main window with the map ticked:
