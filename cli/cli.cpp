@@ -19,6 +19,9 @@
 #include "core/run.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
+#ifdef KAVU_CLI_PICTURES
+#include "cli/pictures.h"
+#endif
 
 namespace kavu {
 
@@ -34,6 +37,10 @@ constexpr std::string_view kFooter =
   --dxf     the drawing exchange file NAME.dxf
   --pegs    the auxiliary-peg file NAME.cp
   --kc      the control-coordinate file NAME.kc
+Pictures (in a build with Qt) go where their option says:
+  --png, --svg  the map of the whole survey (control points, stations,
+            pegs, detail points; points named in NAME.err in red)
+  --pdf     the field sketch on A4 pages (ticks --sketch)
 The error report NAME.err and the station listing NAME.cpv are always written
 and are removed again when the run finds no data error. Instrument files
 (.sdr .gre .obs .set .idx .tcm) are first converted into the field book
@@ -158,6 +165,7 @@ struct Settings {
   bool asc = false, txt = false, sketch = false, dxf = false, pegs = false, kc = false;
   bool all = false;
   bool heights = true;
+  std::string png, svg, pdf;
   std::string controlFile;
   std::string seed;
   std::array<std::string, 7> header{};
@@ -212,6 +220,12 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   app.add_flag("--pegs", set.pegs, "write the auxiliary-peg file");
   app.add_flag("--kc", set.kc, "write the control-coordinate file");
   app.add_flag("--all", set.all, "write all six products");
+  app.add_option("--png", set.png, "draw the map of the survey as a PNG picture")
+      ->type_name("FILE");
+  app.add_option("--svg", set.svg, "draw the map of the survey as an SVG picture")
+      ->type_name("FILE");
+  app.add_option("--pdf", set.pdf, "print the field sketch to a PDF file (ticks --sketch)")
+      ->type_name("FILE");
   // Each flag sets the value as it is met, so the last one given wins.
   app.add_flag_callback(
          "--heights", [&set] { set.heights = true; },
@@ -259,6 +273,11 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
       return Usage(err, "--seed: expected a whole number from 0 to 2^64-1, got: " + set.seed);
   }
 
+  const bool pictures = !set.png.empty() || !set.svg.empty() || !set.pdf.empty();
+#ifndef KAVU_CLI_PICTURES
+  if (pictures) return Usage(err, "--png, --svg and --pdf: this kavu-cli was built without Qt");
+#endif
+
   RunState st;
   st.txtfile = set.file;
   st.kindOverride = *kind;
@@ -268,7 +287,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   const auto tick = [&](bool wanted) { return wanted || set.all ? 1 : 0; };
   st.fasc = tick(set.asc);
   st.ftd = tick(set.txt);
-  st.fsdo = tick(set.sketch);
+  st.fsdo = tick(set.sketch || !set.pdf.empty());
   st.fdxf = tick(set.dxf);
   st.fcp = tick(set.pegs);
   st.fkc = tick(set.kc);
@@ -292,6 +311,13 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   host.ClearProgress();
   if (result.outcome == RunOutcome::Cancelled) return kExitInterrupted;
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
+#ifdef KAVU_CLI_PICTURES
+  if (pictures) {
+    for (std::string& path : WritePictures(st, {set.png, set.svg, set.pdf})) {
+      result.unwritable.push_back(std::move(path));
+    }
+  }
+#endif
 
   for (const std::string& line : SummaryLines(result)) out << line << '\n';
   for (const std::string& path : result.unwritable) out << msg::kCannotWrite << path << '\n';

@@ -30,9 +30,11 @@
 #include "import/dispatch.h"
 #include "ui/editor.h"
 #include "ui/lists.h"
+#include "ui/map_window.h"
 #include "ui/nhapsdo.h"
 #include "ui/runthread.h"
 #include "ui/settings.h"
+#include "ui/survey_of.h"
 #include "ui/texts.h"
 #include "ui/timthay.h"
 
@@ -94,6 +96,8 @@ std::string Std(const QString& text) { return text.toStdString(); }
 // The recent files: a key of their own, the paths one a line.
 constexpr const char* kRecentKey = "KAVU_Recent";
 constexpr qsizetype kRecentCount = 8;
+// Whether the map opens by itself after a run: "1" or "0".
+constexpr const char* kOpenMapKey = "KAVU_OpenMap";
 
 #ifdef _WIN32
 constexpr const char* kDefaultFolder = "c:\\";
@@ -134,9 +138,44 @@ MainWindow::MainWindow(QWidget* parent) : Window(parent), ask_(this) {
   }
   lsttm_->setPath(QDir::currentPath());
   Form_Load();
+  ckBando_->setChecked(SettingsStore().read(kOpenMapKey, QStringLiteral("0")) ==
+                       QLatin1String("1"));
 }
 
 MainWindow::~MainWindow() { delete nhapsdo_.data(); }
+
+void MainWindow::buildMapControls(QBoxLayout* buttons) {
+  bando_ = MakeButton(this, "bando", Q(kMapButton));
+  bando_->setEnabled(false);  // until a run has completed
+  ckBando_ = MakeBox(this, "ckBando", kOpenMapAfterRun);
+  const int compute = buttons->indexOf(findChild<QPushButton*>(QStringLiteral("tinh")));
+  buttons->insertWidget(compute + 1, bando_);
+  buttons->insertWidget(buttons->count() - 1, ckBando_);
+  connect(bando_, &QPushButton::clicked, this, &MainWindow::bando_Click);
+}
+
+MapWindow& MainWindow::mapWindow() {
+  if (!map_) map_ = std::make_unique<MapWindow>();
+  return *map_;
+}
+
+void MainWindow::afterRun() {
+  if (ending_ || lastRun_.outcome != RunOutcome::Completed) return;
+  mapStale_ = true;
+  bando_->setEnabled(true);
+  if (ckBando_->isChecked() || (map_ && map_->isVisible())) bando_Click();
+}
+
+void MainWindow::bando_Click() {
+  if (!bando_->isEnabled()) return;
+  MapWindow& map = mapWindow();
+  if (mapStale_) {
+    map.setSurvey(SurveyOf(st_), st_.filesl, Ticked(st_.fsdo) ? st_.daufile + ".sdo" : "");
+    mapStale_ = false;
+  }
+  map.show();
+  map.raise();
+}
 
 void MainWindow::buildControls() {
   auto* lbtieude = MakeLabel(this, "lbtieude", kTitleLabel);
@@ -256,6 +295,7 @@ void MainWindow::buildControls() {
   buttons->addStretch();
   for (QPushButton* button : {tinh, suasolieu, trogiup, thoat}) buttons->addWidget(button);
   buttons->addStretch();
+  buildMapControls(buttons);
   grid->addLayout(buttons, 4, 0, 1, 3);
   grid->setColumnStretch(0, 1);
   grid->setColumnStretch(1, 1);
@@ -479,6 +519,7 @@ void MainWindow::tinh_Click() {
     writeSettingsOnce();
     endProgram();
   }
+  afterRun();
 }
 
 Nhapsdo& MainWindow::headerForm() {
@@ -553,6 +594,8 @@ void MainWindow::writeSettingsOnce() {
   settingsWritten_ = true;
   GhiCaiDat();
   SettingsStore().write(kRecentKey, recent_.join(QLatin1Char('\n')));
+  SettingsStore().write(kOpenMapKey,
+                        ckBando_->isChecked() ? QStringLiteral("1") : QStringLiteral("0"));
 }
 
 bool MainWindow::editsSettled() { return suasl_->maySave() && xem_->maySave(); }
@@ -563,9 +606,9 @@ void MainWindow::endProgram() {
   // The other windows close with their own closing steps (the header form
   // keeps its texts).
   if (!nhapsdo_.isNull()) nhapsdo_->close();
-  for (QWidget* window :
-       {static_cast<QWidget*>(timthay_.get()), static_cast<QWidget*>(xem_.get()),
-        static_cast<QWidget*>(suasl_.get()), static_cast<QWidget*>(help_.get())}) {
+  for (QWidget* window : {static_cast<QWidget*>(timthay_.get()), static_cast<QWidget*>(xem_.get()),
+                          static_cast<QWidget*>(suasl_.get()), static_cast<QWidget*>(help_.get()),
+                          static_cast<QWidget*>(map_.get())}) {
     if (window != nullptr) window->close();
   }
   close();

@@ -14,6 +14,7 @@
 #include "ui/ask.h"
 #include "ui/dialog.h"
 
+class QBoxLayout;
 class QCheckBox;
 class QComboBox;
 class QLabel;
@@ -28,6 +29,7 @@ namespace kavu::ui {
 class DriveList;
 class FileList;
 class FolderList;
+class MapWindow;
 class Nhapsdo;
 class RunThread;
 class Suasl;
@@ -90,6 +92,9 @@ class MainWindow : public Window, public Host {
   void thoat_Click();
   // The stop button beside the progress of a run.
   void dung_Click();
+  // Shows the last completed run on the map.
+  void bando_Click();
+  MapWindow& mapWindow();
 
   // Host: what the computation run asks of the window.
   MsgAnswer MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) override;
@@ -125,6 +130,9 @@ class MainWindow : public Window, public Host {
   // The run of st_ on a thread of its own; the window keeps drawing and only
   // the stop button takes input until the run has ended.
   RunResult computeOffThread();
+  // The map button beside the compute button and the "open after a run" box.
+  void buildMapControls(QBoxLayout* buttons);
+  void afterRun();
 
   RunState st_;
   RunResult lastRun_;
@@ -162,6 +170,10 @@ class MainWindow : public Window, public Host {
   std::unique_ptr<Suasl> suasl_;
   std::unique_ptr<Window> help_;
   QPointer<Nhapsdo> nhapsdo_;
+  QPushButton* bando_ = nullptr;
+  QCheckBox* ckBando_ = nullptr;
+  std::unique_ptr<MapWindow> map_;
+  bool mapStale_ = false;  // a run completed since the map was drawn
 };
 
 }  // namespace kavu::ui
