@@ -25,31 +25,12 @@
 #include "core/host.h"
 #include "core/lines.h"
 #include "run/run.h"
+#include "tests/generated_book.h"
 
 namespace {
 
 namespace fs = std::filesystem;
 using Clock = std::chrono::steady_clock;
-
-// A field book of `stations` set-ups on a line of control points, each with
-// `points` detail points, a peg and a check record.
-std::string FieldBook(int stations, int points) {
-  std::string book;
-  for (int k = 0; k <= stations; ++k) {
-    book += "TR K" + std::to_string(k) + " " + std::to_string(1000 + 100 * k) + " 5000 10\r\n";
-  }
-  for (int k = 1; k <= stations; ++k) {
-    book += "TR K" + std::to_string(k) + " 1.5\r\nDKD K" + std::to_string(k - 1) + "\r\n";
-    for (int p = 0; p < points; ++p) {
-      const int reading = (p * 7919) % 3600000;
-      book += std::to_string(k) + "-" + std::to_string(p) + " " + std::to_string(reading) + " " +
-              std::to_string(5 + p % 150) + ".125 0893000 1.5 N\r\n";
-    }
-    book += "C" + std::to_string(k) + " 1800000 20 900000 1.5 CP" + std::to_string(k) + "\r\n";
-    book += "T" + std::to_string(k) + " 0 100 900000 1.5 K" + std::to_string(k + 1) + " KT\r\n";
-  }
-  return book;
-}
 
 struct Measure {
   double seconds = 0;
@@ -140,7 +121,8 @@ int main(int argc, char** argv) {
   for (const int stations : {100, 1000, 10000}) {
     if (quick && stations > 1000) break;
     const int points = 100;
-    const fs::path file = Job(std::to_string(stations), FieldBook(stations, points));
+    const fs::path file =
+        Job(std::to_string(stations), kavu::testing::GeneratedFieldBook(stations, points));
     const fs::path root = file.parent_path().parent_path();
     std::vector<Measure> runs, floors;
     for (int k = 0; k < kRepeats; ++k) runs.push_back(InChild([&] { Compute(file); }));
@@ -151,8 +133,8 @@ int main(int argc, char** argv) {
     const double perPoint = run.seconds / (stations * points) * 1e6;
     if (stations == 100) perPointAt10k = perPoint;
     std::printf("%-28s %10.3f %10.3f %8.1f %12.2f %10.1f %10.1f\n",
-                (std::to_string(stations * points) + " points").c_str(), run.seconds,
-                floor.seconds, run.seconds / floor.seconds, perPoint, run.peakMiB,
+                (std::to_string(stations * points) + " points").c_str(), run.seconds, floor.seconds,
+                run.seconds / floor.seconds, perPoint, run.peakMiB,
                 static_cast<double>(fs::file_size(file)) / (1 << 20));
     if (stations > 100) {
       std::printf("%-28s %.2fx the time a point at 10,000 points\n", "", perPoint / perPointAt10k);
@@ -169,14 +151,14 @@ int main(int argc, char** argv) {
     return book;
   };
   const auto longLine = [] { return std::string(200 << 20, '7'); };
-  for (const auto& [name, make] : {std::pair<const char*, std::string (*)()>{
-                                       "10M lines of 1-2 characters", shortLines},
-                                   {"one line of 200 MB", longLine}}) {
+  for (const auto& [name, make] :
+       {std::pair<const char*, std::string (*)()>{"10M lines of 1-2 characters", shortLines},
+        {"one line of 200 MB", longLine}}) {
     const fs::path file = Job("hostile", make());
     const Measure run = InChild([&] { Compute(file); });
     const double inputMiB = static_cast<double>(fs::file_size(file)) / (1 << 20);
-    std::printf("%-28s %10.3f %10s %8s %12s %10.1f %10.1f  (limit %.0f MiB)\n", name,
-                run.seconds, "-", "-", "-", run.peakMiB, inputMiB, 3 * inputMiB + 64);
+    std::printf("%-28s %10.3f %10s %8s %12s %10.1f %10.1f  (limit %.0f MiB)\n", name, run.seconds,
+                "-", "-", "-", run.peakMiB, inputMiB, 3 * inputMiB + 64);
     fs::remove_all(file.parent_path().parent_path());
   }
   return 0;

@@ -88,5 +88,8 @@ inline constexpr std::string_view kConversionOverInput =
     "File số liệu chuyển đổi sẽ ghi đè File đầu vào: ";
 inline constexpr std::string_view kBeingComputed = "File đang được tính: ";
 inline constexpr std::string_view kNotDataFile = "Không phải File dữ liệu: ";
+// A run the user stopped, in place of the summary.
+inline constexpr std::string_view kRunCancelled =
+    "Đã dừng tính theo yêu cầu: không ghi File kết quả nào, các File cũ giữ nguyên.";
 
 }  // namespace kavu::msg

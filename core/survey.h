@@ -37,11 +37,11 @@ struct ComputedPoint {
   std::string name;
   double x = 0, y = 0;
   std::optional<double> h;  // when heights are on
-  double z = 0;             // the height as computed, unrounded (also with heights off)
   std::string code, note;
   PointKind kind = PointKind::Detail;
   std::size_t station = 0;  // index into Survey::stations
   std::size_t line = 0;     // field-book line of its record (from 1)
+  double z = 0;             // the height as computed, unrounded (also with heights off)
 };
 
 // One message of the error report, in run order.

@@ -49,6 +49,8 @@ class WorkingCopy {
  public:
   explicit WorkingCopy(RunState& st) : st_(st) {}
   bool AtEnd() const { return next_ >= st_.tamsl.size(); }
+  long long LinesRead() const { return static_cast<long long>(next_); }
+  long long Lines() const { return static_cast<long long>(st_.tamsl.size()); }
   void ReadLine() {
     st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
     // Each line is read once: it leaves the working copy.
@@ -333,7 +335,8 @@ RunResult tinh_Click(RunState& st, Host& host) {
   Counters counters;
   WorkingCopy copy(st);
   copy.ReadLine();
-  while (!copy.AtEnd()) {
+  while (!copy.AtEnd() && !host.Cancelled()) {
+    host.Progress(copy.LinesRead(), copy.Lines());
     const std::size_t stationLine = st.line;
     ReadStationHeader(st, copy);
     if (st.I != 0) {
@@ -341,6 +344,13 @@ RunResult tinh_Click(RunState& st, Host& host) {
     } else {
       SkipStation(st, copy, stationLine);
     }
+  }
+  // Stopped by the user: as a run that stops early, nothing is written.
+  if (host.Cancelled()) {
+    AbandonKeptFiles(st);
+    host.SetTitle(msg::kProgramTitle);
+    host.MessageBox(msg::kRunCancelled, MsgIcon::Information, MsgButtons::Ok);
+    return Finish(st, RunOutcome::Cancelled);
   }
 
   // A run without errors leaves no error report and no station listing.
