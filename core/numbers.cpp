@@ -4,6 +4,7 @@
 #include <charconv>
 #include <cmath>
 #include <cstddef>
+#include <cstdint>
 #include <string>
 #include <system_error>
 
@@ -159,8 +160,9 @@ std::string Mask(double x, std::string_view mask) {
   if (std::fabs(y) < kTwoTo53) {
     const double whole = std::round(y);  // half away from zero
     negative = whole < 0;
+    // Below 2^53 the whole number is exact: its digits are those of the integer.
     written =
-        std::to_chars(first_digit, buf + sizeof buf, std::fabs(whole), std::chars_format::fixed, 0);
+        std::to_chars(first_digit, buf + sizeof buf, static_cast<std::uint64_t>(std::fabs(whole)));
   } else {
     // Beyond 2^53 the scaled value is no longer exact: the value's own
     // decimal expansion is written, to the mask's decimals.
