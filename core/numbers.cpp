@@ -208,8 +208,38 @@ std::string Mask(double x, std::string_view mask) {
   return out;
 }
 
+namespace {
+
+// NumberText of a value that is the nearest double to a decimal of at most
+// 3 decimals and 15 significant digits (every coordinate the run rounds to the
+// millimetre): that decimal, written from the integer of its thousandths.
+// False for any other value.
+bool MillimetreText(double x, std::string& text) {
+  const double y = x * 1000;
+  if (!(std::fabs(y) < 1e15) || std::fabs(x) < 1e-4) return false;
+  const auto r = static_cast<std::int64_t>(std::llround(y));
+  if (static_cast<double>(r) / 1000 != x) return false;
+  char digits[24];
+  char* end = std::to_chars(digits, digits + sizeof digits, r < 0 ? -r : r).ptr;
+  std::size_t n = static_cast<std::size_t>(end - digits);
+  // The integer part (empty below 1, as the shortened "0." is) and the
+  // fraction without its trailing zeros.
+  const std::size_t whole = n > 3 ? n - 3 : 0;
+  std::string fraction(3 - std::min<std::size_t>(n, 3), '0');
+  fraction.append(digits + whole, n - whole);
+  while (!fraction.empty() && fraction.back() == '0') fraction.pop_back();
+  text.clear();
+  if (r < 0) text.push_back('-');
+  text.append(digits, whole);
+  if (!fraction.empty()) text.append(".").append(fraction);
+  return true;
+}
+
+}  // namespace
+
 std::string NumberText(double x) {
   if (x == 0) return "0";
+  if (std::string text; MillimetreText(x, text)) return text;
   char buf[64];
   const auto [ptr, ec] = std::to_chars(buf, buf + sizeof buf, x, std::chars_format::general, 15);
   std::string text = ec == std::errc() ? std::string(buf, ptr) : std::string("0");
