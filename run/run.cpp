@@ -345,6 +345,9 @@ RunResult tinh_Click(RunState& st, Host& host) {
       SkipStation(st, copy, stationLine);
     }
   }
+  // Every line of the working copy has been read.
+  st.tamsl = {};
+  st.tamslLine = {};
   // Stopped by the user: as a run that stops early, nothing is written.
   if (host.Cancelled()) {
     AbandonKeptFiles(st);
