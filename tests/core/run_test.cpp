@@ -113,6 +113,15 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_EQ(survey.stations[0].orientationDistance, 100);
   EXPECT_EQ(survey.stations[0].line, 8u);
   EXPECT_EQ(survey.control.front().name, "KC1");
+  // The check sight on KC3, and the pegs among the points, in field-book order.
+  ASSERT_TRUE(survey.stations[0].check);
+  EXPECT_EQ(survey.stations[0].check->name, "KC3");
+  EXPECT_TRUE(survey.stations[0].checkResidual);
+  std::vector<std::string> pegs;
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind == PointKind::Peg) pegs.push_back(point.name);
+  }
+  EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
 
 // The regenerated field book is itself a field book: computing it again
