@@ -11,8 +11,6 @@ const std::string& ComputationFields::Field(std::size_t i) const {
 
 void ReportError(RunState& st, std::string_view line, std::string_view point) {
   ++st.err;
-  st.errFile.Line("");
-  st.errFile.Line(line);
   st.survey.report.push_back({std::string(line), Trim(point), st.line});
 }
 

@@ -156,7 +156,7 @@ struct ComputationFields {
   bool hasZ = false;
 
   // Files kept open through the station loop.
-  TextOut errFile;  // error report .err
+  TextOut errFile;  // error report .err, written from survey.report at the end
   TextOut cpvFile;  // station listing .cpv
   TextOut sdoFile;  // field sketch .sdo
   TextOut cpFile;   // auxiliary-peg file .cp
@@ -177,8 +177,8 @@ struct RunState : WindowFields, FileSelection, ComputationFields {
   void ResetComputation() { static_cast<ComputationFields&>(*this) = ComputationFields{}; }
 };
 
-// Appends an empty line and a message line to the error report and counts it;
-// point is the name the line concerns (empty when none).
+// Adds a message to the run's report (survey.report) and counts it; point is
+// the name the line concerns (empty when none).
 void ReportError(RunState& st, std::string_view line, std::string_view point = {});
 
 }  // namespace kavu

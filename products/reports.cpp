@@ -12,9 +12,13 @@
 
 namespace kavu {
 
-void WriteErrorReportHeader(TextOut& out) {
+void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report) {
   out.Line(msg::kErrHeader1);
   out.Line(msg::kErrHeader2);
+  for (const ReportEntry& entry : report) {
+    if (entry.counted) out.Line("");
+    out.Line(entry.text);
+  }
 }
 
 void WriteStationListingHeader(TextOut& out) {

@@ -7,7 +7,9 @@
 
 namespace kavu {
 
-void WriteErrorReportHeader(TextOut& out);
+// The error report (.err): its head, then each message, an error set off by
+// an empty line.
+void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report);
 void WriteStationListingHeader(TextOut& out);
 
 // True when the product at path would replace a file the run reads: it is

@@ -177,8 +177,7 @@ void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   const std::string line = std::string(msg::kSkippedFrom) + st.DiemDau.str() +
                            std::string(msg::kSkippedTo) + st.DiemCuoi.str() +
                            std::string(msg::kSkippedEnd);
-  st.errFile.Line(line);
-  st.survey.report.push_back({line, std::string(), stationLine});
+  st.survey.report.push_back({line, std::string(), stationLine, false});
 }
 
 // Station and orientation records of a block; I = 0 when it cannot be computed.
@@ -309,7 +308,6 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.fcp)) OpenKeptFile(st, st.cpFile, st.daufile + ".cp");
   if (Ticked(st.fsdo)) OpenKeptFile(st, st.sdoFile, st.daufile + ".sdo");
   OpenKeptFile(st, st.errFile, st.daufile + ".err");
-  WriteErrorReportHeader(st.errFile);
   for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
@@ -363,6 +361,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
     CommitKeptFile(st, st.cpvFile);
+    WriteErrorReport(st.errFile, st.survey.report);
     CommitKeptFile(st, st.errFile);
   }
   WriteTextProducts(st);

@@ -57,7 +57,6 @@ RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
 TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
   RunState st = PegState(folder, 1, 1);
-  st.errFile.open(folder / "JOB1.err");
 
   WritePegFileHead(st);
   EXPECT_EQ(st.TenKC.str(), "\xa7\xd3i1        ");
@@ -77,11 +76,10 @@ TEST(Pegs, HeadAndStationBlocks) {
   EXPECT_EQ(st.err, 2);
 
   ASSERT_TRUE(st.cpFile.close());
-  ASSERT_TRUE(st.errFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
-  EXPECT_EQ(FileBytes(folder / "JOB1.err"),
-            "\r\nDiem M7           nhap sai phan do\r\n"
-            "\r\nDiem M9           nhap sai phan do\r\n");
+  ASSERT_EQ(st.survey.report.size(), 2u);
+  EXPECT_EQ(st.survey.report[0].text, "Diem M7           nhap sai phan do");
+  EXPECT_EQ(st.survey.report[1].text, "Diem M9           nhap sai phan do");
 }
 
 TEST(Pegs, HeadWithoutHeights) {
