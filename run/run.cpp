@@ -180,6 +180,25 @@ void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   st.survey.report.push_back({line, std::string(), stationLine, false});
 }
 
+// The coordinates the lookup found, in numbers and as texts; none (and I = 0)
+// when it found nothing.
+void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& textX,
+                  std::string& textY, std::string& textZ) {
+  if (st.n != 0) {
+    x = st.X;
+    y = st.Y;
+    z = st.Z;
+    textX = st.StX.str();
+    textY = st.StY.str();
+    textZ = st.StZ.str();
+  } else {
+    st.I = 0;
+    textX.clear();
+    textY.clear();
+    textZ.clear();
+  }
+}
+
 // Station and orientation records of a block; I = 0 when it cannot be computed.
 void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
@@ -198,19 +217,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     }
     TimToaDoDiem(st);
     st.TenTram = st.TenKC.str();
-    if (st.n != 0) {
-      st.xTR = st.X;
-      st.yTR = st.Y;
-      st.zTR = st.Z;
-      st.StXTram = st.StX.str();
-      st.StYTram = st.StY.str();
-      st.StZTram = st.StZ.str();
-    } else {
-      st.I = 0;
-      st.StXTram.clear();
-      st.StYTram.clear();
-      st.StZTram.clear();
-    }
+    TakeLookedUp(st, st.xTR, st.yTR, st.zTR, st.StXTram, st.StYTram, st.StZTram);
   } else {
     st.I = 0;
     ReportError(st,
@@ -225,19 +232,7 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);
     st.TenDinhHuong = st.TenKC.str();
-    if (st.n != 0) {
-      st.xDKD = st.X;
-      st.yDKD = st.Y;
-      st.zDKD = st.Z;
-      st.StXDinhHuong = st.StX.str();
-      st.StYDinhHuong = st.StY.str();
-      st.StZDinhHuong = st.StZ.str();
-    } else {
-      st.I = 0;
-      st.StXDinhHuong.clear();
-      st.StYDinhHuong.clear();
-      st.StZDinhHuong.clear();
-    }
+    TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
   } else {
     st.I = 0;
     ReportError(
