@@ -16,9 +16,9 @@
 
 #include "core/host.h"
 #include "core/messages.h"
-#include "core/run.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
+#include "run/run.h"
 #ifdef KAVU_CLI_PICTURES
 #include "cli/pictures.h"
 #endif
@@ -313,7 +313,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
 #ifdef KAVU_CLI_PICTURES
   if (pictures) {
-    for (std::string& path : WritePictures(st, {set.png, set.svg, set.pdf})) {
+    for (std::string& path : WritePictures(st, result.survey, {set.png, set.svg, set.pdf})) {
       result.unwritable.push_back(std::move(path));
     }
   }

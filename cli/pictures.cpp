@@ -9,11 +9,11 @@
 #include "core/messages.h"
 #include "ui/map_model.h"
 #include "ui/sketch_pdf.h"
-#include "ui/survey_of.h"
 
 namespace kavu {
 
-std::vector<std::string> WritePictures(const RunState& st, const PictureFiles& files) {
+std::vector<std::string> WritePictures(const RunState& st, const Survey& survey,
+                                       const PictureFiles& files) {
   // Qt paints through an application object; a batch command needs no
   // display, so it paints off screen unless told otherwise.
   int argc = 1;
@@ -45,7 +45,7 @@ std::vector<std::string> WritePictures(const RunState& st, const PictureFiles& f
     return false;
   };
   if (!files.png.empty() || !files.svg.empty()) {
-    const ui::MapModel model = ui::BuildMap(SurveyOf(st));
+    const ui::MapModel model = ui::BuildMap(survey);
     const ui::MapView view = ui::FitView(model, ui::kWholeSurveySize);
     if (!files.png.empty() && !overInput(files.png) &&
         !ui::SaveMapPng(model, view, path(files.png))) {

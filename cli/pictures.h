@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "core/state.h"
+#include "core/survey.h"
 
 namespace kavu {
 
@@ -13,8 +14,9 @@ struct PictureFiles {
   std::string png, svg, pdf;  // UTF-8 paths; empty when not asked for
 };
 
-// Draws the completed run in st (its field sketch from daufile + ".sdo").
-// Returns the files that could not be written.
-std::vector<std::string> WritePictures(const RunState& st, const PictureFiles& files);
+// Draws the completed run in st with its survey (its field sketch from
+// daufile + ".sdo"). Returns the files that could not be written.
+std::vector<std::string> WritePictures(const RunState& st, const Survey& survey,
+                                       const PictureFiles& files);
 
 }  // namespace kavu

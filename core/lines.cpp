@@ -29,22 +29,25 @@
 
 namespace kavu {
 
+bool LineReader::Next(std::string_view& line) {
+  if (next_ >= content_.size()) return false;
+  const std::size_t start = next_;
+  const std::size_t end = content_.find_first_of("\r\n", start);
+  if (end == std::string_view::npos) {
+    line = content_.substr(start);
+    next_ = content_.size();
+    return true;
+  }
+  line = content_.substr(start, end - start);
+  next_ = end + 1;
+  if (content_[end] == '\r' && next_ < content_.size() && content_[next_] == '\n') ++next_;
+  return true;
+}
+
 std::vector<std::string> SplitLines(std::string_view content) {
   std::vector<std::string> lines;
-  std::size_t start = 0;
-  std::size_t i = 0;
-  while (i < content.size()) {
-    const char c = content[i];
-    if (c == '\r' || c == '\n') {
-      lines.emplace_back(content.substr(start, i - start));
-      ++i;
-      if (c == '\r' && i < content.size() && content[i] == '\n') ++i;
-      start = i;
-    } else {
-      ++i;
-    }
-  }
-  if (start < content.size()) lines.emplace_back(content.substr(start));
+  LineReader reader(content);
+  for (std::string_view line; reader.Next(line);) lines.emplace_back(line);
   return lines;
 }
 
@@ -116,12 +119,16 @@ TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
 bool TextOut::open(const std::string& utf8Path) { return open(PathFromUtf8(utf8Path)); }
 
 TextOut::TextOut(TextOut&& other) noexcept
-    : file_(std::move(other.file_)), path_(std::move(other.path_)), failed_(other.failed_) {}
+    : file_(std::move(other.file_)),
+      buffer_(std::move(other.buffer_)),
+      path_(std::move(other.path_)),
+      failed_(other.failed_) {}
 
 TextOut& TextOut::operator=(TextOut&& other) noexcept {
   if (this != &other) {
     abandon();
     file_ = std::move(other.file_);
+    buffer_ = std::move(other.buffer_);
     path_ = std::move(other.path_);
     failed_ = other.failed_;
   }
@@ -149,14 +156,37 @@ bool TextOut::open(const std::filesystem::path& path) {
 
 bool TextOut::ok() const { return file_ != nullptr && !failed_; }
 
+namespace {
+constexpr std::size_t kBlock = 1 << 16;
+}  // namespace
+
+bool TextOut::Drain() {
+  if (!buffer_.empty() && ok() &&
+      std::fwrite(buffer_.data(), 1, buffer_.size(), file_.get()) != buffer_.size()) {
+    failed_ = true;
+  }
+  buffer_.clear();
+  return ok();
+}
+
 void TextOut::Write(std::string_view text) {
   if (!ok() || text.empty()) return;
-  if (std::fwrite(text.data(), 1, text.size(), file_.get()) != text.size()) failed_ = true;
+  if (text.size() >= kBlock) {
+    // A large text goes straight to the file, after what is waiting.
+    if (Drain() && std::fwrite(text.data(), 1, text.size(), file_.get()) != text.size()) {
+      failed_ = true;
+    }
+    return;
+  }
+  buffer_.append(text);
+  if (buffer_.size() >= kBlock) Drain();
 }
 
 void TextOut::Line(std::string_view text) {
-  Write(text);
-  Write("\r\n");
+  if (!ok()) return;
+  buffer_.append(text);
+  buffer_.append("\r\n");
+  if (buffer_.size() >= kBlock) Drain();
 }
 
 namespace {
@@ -175,7 +205,7 @@ bool FlushToDisk(std::FILE* file) {
 
 bool TextOut::commit() {
   if (!file_) return !failed_;
-  bool written = !failed_ && FlushToDisk(file_.get());
+  bool written = Drain() && FlushToDisk(file_.get());
   written = std::fclose(file_.release()) == 0 && written;
   const std::filesystem::path temp = TempPathOf(path_);
   std::error_code ec;
@@ -192,6 +222,7 @@ bool TextOut::commit() {
 }
 
 void TextOut::abandon() {
+  buffer_.clear();
   if (!file_) return;
   std::fclose(file_.release());
   std::error_code ec;

@@ -14,6 +14,18 @@
 
 namespace kavu {
 
+// The lines of a file's bytes, one at a time, as views into them.
+class LineReader {
+ public:
+  explicit LineReader(std::string_view content) : content_(content) {}
+  // The next line; false after the last.
+  bool Next(std::string_view& line);
+
+ private:
+  std::string_view content_;
+  std::size_t next_ = 0;
+};
+
 // Splits a file's bytes into its lines.
 std::vector<std::string> SplitLines(std::string_view content);
 
@@ -77,6 +89,9 @@ class TextOut {
     void operator()(std::FILE* file) const { std::fclose(file); }
   };
   std::unique_ptr<std::FILE, Closer> file_;
+  // Written to the file a block at a time.
+  bool Drain();
+  std::string buffer_;
   std::filesystem::path path_;
   bool failed_ = false;
 };

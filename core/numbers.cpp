@@ -1,8 +1,10 @@
 #include "core/numbers.h"
 
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <cstddef>
+#include <cstdint>
 #include <string>
 #include <system_error>
 
@@ -17,6 +19,32 @@ struct Scan {
   bool has_digit = false;
 };
 
+// The characters of a number as it is scanned: on the stack, unless the text
+// is longer than any number the files hold.
+class NumberBuffer {
+ public:
+  void push_back(char c) {
+    if (large_.empty() && size_ < sizeof small_) {
+      small_[size_++] = c;
+      return;
+    }
+    if (large_.empty()) large_.assign(small_, size_);
+    large_.push_back(c);
+    ++size_;
+  }
+  void resize(std::size_t size) {
+    size_ = size;
+    if (!large_.empty()) large_.resize(size);
+  }
+  const char* data() const { return large_.empty() ? small_ : large_.data(); }
+  std::size_t size() const { return size_; }
+
+ private:
+  char small_[64];
+  std::size_t size_ = 0;
+  std::string large_;
+};
+
 // Reads the numeric prefix of a text into a clean buffer ("-12.5e1") and
 // converts it. Blanks inside the number are skipped wherever they stand.
 Scan ScanNumber(std::string_view text) {
@@ -26,44 +54,43 @@ Scan ScanNumber(std::string_view text) {
     while (i < n && IsBlank(text[i])) ++i;
   };
 
-  std::string buf;
+  NumberBuffer buf;
   skip_blanks();
   if (i < n && (text[i] == '+' || text[i] == '-')) {
     if (text[i] == '-') buf.push_back('-');
     ++i;
   }
-  std::string mantissa;
   bool point = false;
   bool digit = false;
   for (skip_blanks(); i < n; ++i, skip_blanks()) {
     const char c = text[i];
     if (IsDigit(c)) {
-      mantissa.push_back(c);
+      buf.push_back(c);
       digit = true;
     } else if (c == '.' && !point) {
-      mantissa.push_back('.');
+      buf.push_back('.');
       point = true;
     } else {
       break;
     }
   }
   if (!digit) return {};
-  buf += mantissa;
 
   if (i < n && (text[i] == 'E' || text[i] == 'e' || text[i] == 'D' || text[i] == 'd')) {
+    const std::size_t mantissa = buf.size();
     ++i;
     skip_blanks();
-    std::string exponent = "e";
+    buf.push_back('e');
     if (i < n && (text[i] == '+' || text[i] == '-')) {
-      exponent.push_back(text[i]);
+      buf.push_back(text[i]);
       ++i;
     }
     bool exp_digit = false;
     for (skip_blanks(); i < n && IsDigit(text[i]); ++i, skip_blanks()) {
-      exponent.push_back(text[i]);
+      buf.push_back(text[i]);
       exp_digit = true;
     }
-    if (exp_digit) buf += exponent;
+    if (!exp_digit) buf.resize(mantissa);
   }
 
   Scan scan;
@@ -82,16 +109,6 @@ double PowerOfTen(int n) {
 }
 
 constexpr double kTwoTo53 = 9007199254740992.0;
-
-// The exact decimal text of a finite, non-negative value with the given
-// number of decimals.
-std::string FixedDigits(double value, int decimals) {
-  char buf[400];
-  const auto [ptr, ec] =
-      std::to_chars(buf, buf + sizeof buf, value, std::chars_format::fixed, decimals);
-  if (ec != std::errc()) return "0";
-  return std::string(buf, ptr);
-}
 
 }  // namespace
 
@@ -131,40 +148,98 @@ std::string Mask(double x, std::string_view mask) {
   std::size_t min_int = 0;
   for (const char c : int_mask) min_int += c == '0' ? 1 : 0;
 
+  // The digits of |x| scaled by 10^decimals, rounded, with room in front for
+  // the zeros that make at least one integer digit.
+  constexpr std::size_t kRoom = 64;
+  char buf[kRoom + 400];
+  char* const first_digit = buf + kRoom;
+  if (decimals + 1 > kRoom) return "0";
   bool negative = false;
-  std::string digits;  // the digits of |x| scaled by 10^decimals, rounded
+  std::to_chars_result written{};
   const double y = x * PowerOfTen(static_cast<int>(decimals));
   if (std::fabs(y) < kTwoTo53) {
     const double whole = std::round(y);  // half away from zero
     negative = whole < 0;
-    digits = FixedDigits(std::fabs(whole), 0);
+    // Below 2^53 the whole number is exact: its digits are those of the integer.
+    written =
+        std::to_chars(first_digit, buf + sizeof buf, static_cast<std::uint64_t>(std::fabs(whole)));
   } else {
     // Beyond 2^53 the scaled value is no longer exact: the value's own
     // decimal expansion is written, to the mask's decimals.
     negative = x < 0;
-    digits = FixedDigits(std::fabs(x), static_cast<int>(decimals));
-    std::erase(digits, '.');
+    written = std::to_chars(first_digit, buf + sizeof buf, std::fabs(x), std::chars_format::fixed,
+                            static_cast<int>(decimals));
   }
-  if (digits.size() < decimals + 1) digits.insert(0, decimals + 1 - digits.size(), '0');
-  std::string int_part = digits.substr(0, digits.size() - decimals);
-  std::string frac_part = digits.substr(digits.size() - decimals);
+  char* end = written.ptr;
+  if (written.ec != std::errc()) {
+    first_digit[0] = '0';
+    end = first_digit + 1;
+  }
+  end = std::remove(first_digit, end, '.');
+  char* digits = first_digit;
+  while (static_cast<std::size_t>(end - digits) < decimals + 1) *--digits = '0';
+  char* const frac = end - decimals;
 
-  const std::size_t first = int_part.find_first_not_of('0');
-  int_part = first == std::string::npos ? std::string() : int_part.substr(first);
-  if (int_part.size() < min_int) int_part.insert(0, min_int - int_part.size(), '0');
+  // The integer digits without leading zeros, then as many zeros as the mask
+  // asks for.
+  char* int_start = digits;
+  while (int_start < frac && *int_start == '0') ++int_start;
+  while (static_cast<std::size_t>(frac - int_start) < min_int) {
+    if (int_start > buf) {
+      *--int_start = '0';
+    } else {
+      return "0";
+    }
+  }
   // A "#" at the end of the fraction is written only when its digit counts.
-  while (!frac_part.empty() && frac_mask[frac_part.size() - 1] == '#' && frac_part.back() == '0')
-    frac_part.pop_back();
+  std::size_t frac_size = decimals;
+  while (frac_size > 0 && frac_mask[frac_size - 1] == '#' && frac[frac_size - 1] == '0') {
+    --frac_size;
+  }
 
   std::string out;
+  out.reserve(static_cast<std::size_t>(frac - int_start) + frac_size + 2);
   if (negative) out.push_back('-');
-  out += int_part;
-  if (point != std::string_view::npos) out += '.' + frac_part;
+  out.append(int_start, frac);
+  if (point != std::string_view::npos) {
+    out.push_back('.');
+    out.append(frac, frac_size);
+  }
   return out;
 }
 
+namespace {
+
+// NumberText of a value that is the nearest double to a decimal of at most
+// 3 decimals and 15 significant digits (every coordinate the run rounds to the
+// millimetre): that decimal, written from the integer of its thousandths.
+// False for any other value.
+bool MillimetreText(double x, std::string& text) {
+  const double y = x * 1000;
+  if (!(std::fabs(y) < 1e15) || std::fabs(x) < 1e-4) return false;
+  const auto r = static_cast<std::int64_t>(std::llround(y));
+  if (static_cast<double>(r) / 1000 != x) return false;
+  char digits[24];
+  char* end = std::to_chars(digits, digits + sizeof digits, r < 0 ? -r : r).ptr;
+  std::size_t n = static_cast<std::size_t>(end - digits);
+  // The integer part (empty below 1, as the shortened "0." is) and the
+  // fraction without its trailing zeros.
+  const std::size_t whole = n > 3 ? n - 3 : 0;
+  std::string fraction(3 - std::min<std::size_t>(n, 3), '0');
+  fraction.append(digits + whole, n - whole);
+  while (!fraction.empty() && fraction.back() == '0') fraction.pop_back();
+  text.clear();
+  if (r < 0) text.push_back('-');
+  text.append(digits, whole);
+  if (!fraction.empty()) text.append(".").append(fraction);
+  return true;
+}
+
+}  // namespace
+
 std::string NumberText(double x) {
   if (x == 0) return "0";
+  if (std::string text; MillimetreText(x, text)) return text;
   char buf[64];
   const auto [ptr, ec] = std::to_chars(buf, buf + sizeof buf, x, std::chars_format::general, 15);
   std::string text = ec == std::errc() ? std::string(buf, ptr) : std::string("0");

@@ -1,5 +1,7 @@
 #include "core/state.h"
 
+#include "core/text.h"
+
 namespace kavu {
 
 const std::string& ComputationFields::Field(std::size_t i) const {
@@ -7,10 +9,9 @@ const std::string& ComputationFields::Field(std::size_t i) const {
   return i < MangTruong.size() ? MangTruong[i] : kNone;
 }
 
-void ReportError(RunState& st, std::string_view line) {
+void ReportError(RunState& st, std::string_view line, std::string_view point) {
   ++st.err;
-  st.errFile.Line("");
-  st.errFile.Line(line);
+  st.survey.report.push_back({std::string(line), Trim(point), st.line});
 }
 
 }  // namespace kavu

@@ -7,11 +7,14 @@
 #include <cstdint>
 #include <optional>
 #include <string>
+#include <unordered_map>
+#include <unordered_set>
 #include <vector>
 
 #include "core/angles.h"
 #include "core/lines.h"
 #include "core/random.h"
+#include "core/survey.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -59,8 +62,6 @@ struct FileSelection {
 
 // A known point: name, X, Y, H as texts.
 using KnownPoint = std::array<std::string, 4>;
-// A computed point: name (12), X, Y, H, code, note.
-using DetailPoint = std::array<std::string, 6>;
 // A field-sketch row: name, horizontal angle, distance, vertical angle, prism
 // height, note.
 using SketchRow = std::array<std::string, 6>;
@@ -117,15 +118,26 @@ struct ComputationFields {
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;
-  std::vector<DetailPoint> MangToaDoChiTiet;
   std::vector<std::string> MangSoLieuASC;
   std::vector<std::string> MangSoLieuToaDo;
   std::vector<SketchRow> MangSoLieuSoDo;
   std::vector<PegEntry> MangCocPhu;
   std::string ChuoiKC;
 
+  // Lookup indexes of the tables above by trimmed name, brought up to date
+  // when a point is looked up: positions in MangKhongChe and
+  // survey.points, the names of the lines of ChuoiKC, the names of
+  // survey.control.
+  struct NameIndex {
+    std::unordered_map<std::string, std::vector<std::size_t>> positions;
+    std::size_t done = 0;
+  };
+  NameIndex knownIndex, detailIndex;
+  std::unordered_set<std::string> chuoiKCNames;
+  std::size_t chuoiKCRead = 0;
+  std::unordered_set<std::string> controlNames;
+
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
-  int sdtd() const { return static_cast<int>(MangToaDoChiTiet.size()); }
   int sdasc() const { return static_cast<int>(MangSoLieuASC.size()); }
   int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
   int sdcp() const { return static_cast<int>(MangCocPhu.size()); }
@@ -133,9 +145,18 @@ struct ComputationFields {
   // The working copy of the field book (without its control-point records),
   // held in memory so that runs never share a file.
   std::vector<std::string> tamsl;
+  // The field-book line (from 1) of each line of the working copy, and of the
+  // record being read (0 when none).
+  std::vector<std::size_t> tamslLine;
+  std::size_t line = 0;
+
+  // What the run found, in numbers.
+  Survey survey;
+  // Whether the point last looked up has a height text.
+  bool hasZ = false;
 
   // Files kept open through the station loop.
-  TextOut errFile;  // error report .err
+  TextOut errFile;  // error report .err, written from survey.report at the end
   TextOut cpvFile;  // station listing .cpv
   TextOut sdoFile;  // field sketch .sdo
   TextOut cpFile;   // auxiliary-peg file .cp
@@ -156,7 +177,8 @@ struct RunState : WindowFields, FileSelection, ComputationFields {
   void ResetComputation() { static_cast<ComputationFields&>(*this) = ComputationFields{}; }
 };
 
-// Appends an empty line and a message line to the error report and counts it.
-void ReportError(RunState& st, std::string_view line);
+// Adds a message to the run's report (survey.report) and counts it; point is
+// the name the line concerns (empty when none).
+void ReportError(RunState& st, std::string_view line, std::string_view point = {});
 
 }  // namespace kavu

@@ -3,17 +3,19 @@
 #include <cmath>
 #include <string>
 
+#include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
+#include "core/results.h"
 #include "core/tcvn3.h"
-#include "products/lookup.h"
-#include "products/results.h"
+#include "core/text.h"
 
 namespace kavu {
 namespace {
 
 void EntryError(RunState& st, std::string_view message) {
-  ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message));
+  ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message),
+              st.TenDiem.str());
 }
 
 // A record whose reading, distance, zenith angle or prism height holds no
@@ -93,12 +95,31 @@ void Orient(RunState& st, const std::string& otherName) {
   GocString(st);
   st.cdh = std::sqrt(dx * dx + dy * dy);
   if (st.cdh > 10000) {
-    ReportError(st, std::string(msg::kPointColon) + st.TenTram.str() + std::string(msg::kOr) +
-                        otherName + std::string(msg::kWrongCoordinates));
+    ReportError(st,
+                std::string(msg::kPointColon) + st.TenTram.str() + std::string(msg::kOr) +
+                    otherName + std::string(msg::kWrongCoordinates),
+                st.TenTram.str());
   }
   st.StCanh = Mask(RoundEven(st.cdh, 3), "####.000");
   const std::string trimmed = Trim(st.StCanh.str());
   if (trimmed.size() < 8) st.StCanh = std::string(8 - trimmed.size(), ' ') + trimmed;
+}
+
+// A computed detail point or peg, as the products write its coordinates.
+void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string code,
+               std::string note) {
+  ComputedPoint point;
+  point.name = Trim(name);
+  point.x = st.xi;
+  point.y = st.yi;
+  if (Ticked(st.fdc)) point.h = Val(st.StZ.str());
+  point.z = st.zi;
+  point.code = std::move(code);
+  point.note = std::move(note);
+  point.kind = kind;
+  point.station = st.survey.stations.size() - 1;
+  point.line = st.line;
+  st.survey.points.push_back(std::move(point));
 }
 
 }  // namespace
@@ -135,6 +156,10 @@ void GocString(RunState& st) {
   st.giay = parts.giay;
 }
 
+std::string NorthingText(double x) { return Mask(x, "#######.000"); }
+std::string EastingText(double y) { return Mask(y, "######.000"); }
+std::string HeightText(double z) { return Mask(z, "######.000"); }
+
 void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
 
 void TinhDoCao(RunState& st) {
@@ -145,7 +170,7 @@ void TinhDoCao(RunState& st) {
   st.rad = st.goc * kPi / 180;
   st.dz = std::tan(st.rad) * st.s;
   st.zi = st.zTR + st.dz + Val(st.ccm) - st.ccg;
-  st.StZ = Mask(st.zi, "######.000");
+  st.StZ = HeightText(st.zi);
 }
 
 void TinhToaDo(RunState& st) {
@@ -161,14 +186,15 @@ void TinhToaDo(RunState& st) {
   st.xi = RoundEven(st.xTR + st.dx, 3);
   st.yi = RoundEven(st.yTR + st.dy, 3);
   st.s = RoundEven(st.s, 3);
-  st.StX = Mask(st.xi, "#######.000");
-  st.StY = Mask(st.yi, "######.000");
+  st.StX = NorthingText(st.xi);
+  st.StY = EastingText(st.yi);
   st.StS = Mask(st.s, "#####.000");
 }
 
 void ReportLongName(RunState& st, std::string_view name) {
   if (name.size() > decltype(st.TenDiem)::kWidth) {
-    ReportError(st, std::string(msg::kPoint) + std::string(name) + std::string(msg::kNameTooLong));
+    ReportError(st, std::string(msg::kPoint) + std::string(name) + std::string(msg::kNameTooLong),
+                name);
   }
 }
 
@@ -189,7 +215,8 @@ void STP5(RunState& st) {
   TinhDoCao(st);
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
-  GhiMangToaDoChiTiet(st);
+  auto [code, note] = CodeAndNote(st);
+  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note));
   GhiMangSoLieuToaDo(st);
   GhiMangSoLieuVaoSoDo(st);
 }
@@ -202,10 +229,11 @@ void STP6(RunState& st) {
     st.s = Val(st.Field(2));
     const bool measured = HasNumber(st.Field(2)) && st.s != 0;
     if (measured && st.TenKC == st.TenDinhHuong && std::fabs(st.s - st.cdhdau) >= st.dscdh) {
-      ReportError(st, std::string(msg::kStation) + st.TenTram.str() +
-                          Utf8ToTcvn3(msg::kOrientation) + st.TenDinhHuong.str() +
-                          std::string(msg::kWrongOrientationDistance) + std::string(msg::kDS) +
-                          ReportNumber(RoundEven(st.s - st.cdhdau, 2)));
+      ReportError(st,
+                  std::string(msg::kStation) + st.TenTram.str() + Utf8ToTcvn3(msg::kOrientation) +
+                      st.TenDinhHuong.str() + std::string(msg::kWrongOrientationDistance) +
+                      std::string(msg::kDS) + ReportNumber(RoundEven(st.s - st.cdhdau, 2)),
+                  st.TenTram.str());
     }
     return;
   }
@@ -218,6 +246,8 @@ void STP6(RunState& st) {
   TinhDoCao(st);
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
+  NotePoint(st, PointKind::Peg, st.TenKC.str(), std::string(),
+            st.stp > 6 ? st.Field(6) : std::string());
   // The peg becomes a known point for the rest of the run.
   st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
   std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
@@ -252,6 +282,9 @@ void STP7(RunState& st) {
     st.goc = st.scgcd;
     GocString(st);
     st.StSaiGoc = st.StGoc;
+    StationResult& station = st.survey.stations.back();
+    station.check = SurveyPoint{Trim(st.TenKC.str()), st.X, st.Y, std::nullopt};
+    station.checkResidual = st.scgcd;
   }
   const double r = st.rng.Next();
   if (!found) {

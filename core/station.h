@@ -11,6 +11,11 @@ void gocdo(RunState& st);
 // StGoc = the text of goc (decimal degrees).
 void GocString(RunState& st);
 
+// The texts of a computed point's X, Y and height as the products write them.
+std::string NorthingText(double x);
+std::string EastingText(double y);
+std::string HeightText(double z);
+
 // Azimuth and distance from the orientation point to the station.
 void TinhPhuongViCanh(RunState& st);
 // Height of the current point from its zenith angle.

@@ -41,6 +41,7 @@ struct ComputedPoint {
   PointKind kind = PointKind::Detail;
   std::size_t station = 0;  // index into Survey::stations
   std::size_t line = 0;     // field-book line of its record (from 1)
+  double z = 0;             // the height as computed, unrounded (also with heights off)
 };
 
 // One message of the error report, in run order.
@@ -48,6 +49,9 @@ struct ReportEntry {
   std::string text;      // the message line as the error report holds it
   std::string point;     // the point the line names ("Diem " + name ...), trimmed, or empty
   std::size_t line = 0;  // field-book line of the record it concerns, 0 when none
+  // An error counted in the summary (set off by an empty line in the error
+  // report); false for a line that goes with the one before it.
+  bool counted = true;
 };
 
 struct Survey {

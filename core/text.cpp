@@ -63,28 +63,45 @@ int KTraCCG(std::string& text) {
   return result;
 }
 
-std::vector<std::string> SplitFields(std::string& line) {
-  std::string normal;
-  normal.reserve(line.size());
+void SplitFields(std::string& line, std::vector<std::string>& fields) {
+  // Normalised in place: the text only ever gets shorter.
+  std::size_t size = 0;
   for (char c : line) {
     if (c == '\t') c = ' ';
-    if (c == ' ' && !normal.empty() && normal.back() == ' ') continue;
-    normal.push_back(c);
+    if (c == ' ' && size > 0 && line[size - 1] == ' ') continue;
+    line[size++] = c;
   }
-  line = normal;
+  line.resize(size);
 
-  std::vector<std::string> fields;
-  if (line.empty()) return fields;
-  std::size_t start = 0;
-  for (;;) {
-    const std::size_t space = line.find(' ', start);
-    if (space == std::string::npos) {
-      fields.push_back(line.substr(start));
-      break;
+  // The vector's strings keep their storage from one line to the next.
+  std::size_t count = 0;
+  auto add = [&](std::string_view field) {
+    if (count < fields.size()) {
+      fields[count].assign(field);
+    } else {
+      fields.emplace_back(field);
     }
-    fields.push_back(line.substr(start, space - start));
-    start = space + 1;
+    ++count;
+  };
+  const std::string_view text = line;
+  if (!text.empty()) {
+    std::size_t start = 0;
+    for (;;) {
+      const std::size_t space = text.find(' ', start);
+      if (space == std::string_view::npos) {
+        add(text.substr(start));
+        break;
+      }
+      add(text.substr(start, space - start));
+      start = space + 1;
+    }
   }
+  fields.resize(count);
+}
+
+std::vector<std::string> SplitFields(std::string& line) {
+  std::vector<std::string> fields;
+  SplitFields(line, fields);
   return fields;
 }
 

@@ -64,5 +64,7 @@ using FixedNumber = FixedText<N, false>;
 // normalised text written back into line; the fields returned. The caller has
 // already removed the surrounding spaces.
 std::vector<std::string> SplitFields(std::string& line);
+// The same into fields, whose strings are reused.
+void SplitFields(std::string& line, std::vector<std::string>& fields);
 
 }  // namespace kavu

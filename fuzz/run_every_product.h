@@ -10,7 +10,7 @@
 
 #include "core/host.h"
 #include "core/lines.h"
-#include "core/run.h"
+#include "run/run.h"
 
 namespace kavu::fuzzing {
 

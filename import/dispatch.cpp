@@ -148,8 +148,7 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   sel.filesl1 = sel.tentmbd + name.substr(0, firstDot) + ".asc";
 }
 
-std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host,
-                                                        FileLock* jobLock) {
+std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* jobLock) {
   // The chosen file.
   if (st.txtfile.empty()) {
     st.filesl.clear();
@@ -239,7 +238,7 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
   st.cbkieu = 0;
   host.ShowFolder(st.tentm, PatternOfKind(0));
   host.SelectKind(0);
-  return SplitLines(*content);
+  return content;
 }
 
 }  // namespace kavu

@@ -28,9 +28,8 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path);
 // converted field book never replaces a file the run reads (st.inputs lists
 // them). With a jobLock, the job's lock is taken before anything is written
 // (a second run of the job is refused) and the temporary files of a killed
-// run are removed. Returns the field book's lines, or nothing when the run
+// run are removed. Returns the field book's bytes, or nothing when the run
 // must end.
-std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host,
-                                                        FileLock* jobLock = nullptr);
+std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* jobLock = nullptr);
 
 }  // namespace kavu

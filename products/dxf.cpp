@@ -5,6 +5,7 @@
 #include <string_view>
 
 #include "core/numbers.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -69,7 +70,7 @@ class EntityWriter {
 
 }  // namespace
 
-bool indxf(RunState& st) {
+bool indxf(const RunState& st) {
   TextOut out;
   if (!out.open(st.daufile + ".dxf")) return false;
 
@@ -82,21 +83,18 @@ bool indxf(RunState& st) {
   dxf.Pair("  2", "ENTITIES");
 
   for (const KnownPoint& point : st.MangKhongChe) {
-    const Position p = RoundedPosition(point[1], point[2]);
-    dxf.Point("KC", p, true);
-    st.X = p.x;
-    st.Y = p.y;
+    dxf.Point("KC", RoundedPosition(point[1], point[2]), true);
   }
   for (const KnownPoint& point : st.MangKhongChe) {
     const Position p = RoundedPosition(point[1], point[2]);
     dxf.Label(p, h / 2, 1.5 * h, TrimView(point[0]), true);
   }
-  for (const DetailPoint& point : st.MangToaDoChiTiet) {
-    const Position p = RoundedPosition(point[1], point[2]);
-    dxf.Label(p, h / 2, h, TrimView(point[0]), false);
+  for (const ComputedPoint& point : st.survey.points) {
+    if (point.kind != PointKind::Detail) continue;
+    // Drawn where the coordinate text file puts it.
+    const Position p = RoundedPosition(NorthingText(point.x), EastingText(point.y));
+    dxf.Label(p, h / 2, h, point.name, false);
     dxf.Point("DIEM", p, false);
-    st.X = p.x;
-    st.Y = p.y;
   }
 
   out.Line(" 0");

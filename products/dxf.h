@@ -7,6 +7,6 @@
 namespace kavu {
 
 // Writes daufile + ".dxf"; false when the file could not be written.
-bool indxf(RunState& st);
+bool indxf(const RunState& st);
 
 }  // namespace kavu

@@ -45,7 +45,8 @@ void incocphu(RunState& st) {
     if (reading.size() > kLongestReading) {
       // An impossible reading ends the station's block; the lines already
       // written stay.
-      ReportError(st, "Diem " + st.TenDiem.str() + std::string(msg::kWrongDegrees));
+      ReportError(st, "Diem " + st.TenDiem.str() + std::string(msg::kWrongDegrees),
+                  st.TenDiem.str());
       return;
     }
     out.Line(Trim(peg[0]) + " " + st.TenDiem.str() + RString(reading, kColumn) +

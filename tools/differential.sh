@@ -20,9 +20,11 @@ base_src=$work/base-src
 . tools/ensure-packages.sh
 ensure_packages cmake ninja-build g++ libcli11-dev python3
 
+launcher=()
+if command -v ccache >/dev/null; then launcher=(-DCMAKE_CXX_COMPILER_LAUNCHER=ccache); fi
 build_cli() {  # source folder, build folder
   cmake -S "$1" -B "$2" -G Ninja -DCMAKE_BUILD_TYPE=Release -DKAVU_BUILD_TESTS=OFF \
-    -DKAVU_BUILD_BENCH=OFF -DKAVU_BUILD_UI=OFF >/dev/null
+    -DKAVU_BUILD_BENCH=OFF -DKAVU_BUILD_UI=OFF "${launcher[@]}" >/dev/null
   cmake --build "$2" --target kavu-cli >/dev/null
 }
 
@@ -33,9 +35,15 @@ trap 'git worktree remove --force "$base_src" >/dev/null 2>&1 || true' EXIT
 build_cli "$base_src" "$work/base-build"
 build_cli "$top" "$work/new-build"
 
-for ((i = 1; i <= count; i++)); do
-  python3 tools/gen_fieldbook.py "$i" "$work/inputs/gen$i.asc"
-done
+# One interpreter writes every generated book, each as the generator alone
+# writes it for its seed.
+python3 - "$count" "$work/inputs" <<'EOF'
+import runpy, sys
+count, folder = int(sys.argv[1]), sys.argv[2]
+for i in range(1, count + 1):
+    sys.argv = ["gen_fieldbook.py", str(i), f"{folder}/gen{i}.asc"]
+    runpy.run_path("tools/gen_fieldbook.py")
+EOF
 while IFS= read -r -d '' f; do
   cp "$f" "$work/inputs/$(echo "${f#./}" | tr / _)"
 done < <(find ./tests/data ./examples -type f \
@@ -60,18 +68,24 @@ run_one() {  # build, input, folder
   sed -i -E 's/[0-9]{2}:[0-9]{2}:[0-9]{2}/HH:MM:SS/' "$3/stdout"
 }
 
-differ=0
-checked=0
-for f in "$work/inputs"/*; do
-  name=$(basename "$f")
-  run_one "$work/base-build" "$f" "$work/base/$name"
-  run_one "$work/new-build" "$f" "$work/new/$name"
-  checked=$((checked + 1))
+# Both builds compute one input; a difference is written beside the results.
+compare_one() {  # input
+  local name
+  name=$(basename "$1")
+  run_one "$work/base-build" "$1" "$work/base/$name"
+  run_one "$work/new-build" "$1" "$work/new/$name"
   if ! diff -r -q "$work/base/$name" "$work/new/$name" >/dev/null; then
-    differ=$((differ + 1))
-    echo "== $name"
-    diff -r "$work/base/$name" "$work/new/$name" | head -n 8 || true
+    { echo "== $name"; diff -r "$work/base/$name" "$work/new/$name" | head -n 8 || true; } \
+      >"$work/differences/$name"
   fi
-done
+}
+export -f run_one compare_one
+export work
+
+mkdir -p "$work/differences"
+find "$work/inputs" -type f -print0 | xargs -0 -n 1 -P "$(nproc)" bash -c 'compare_one "$0"'
+checked=$(find "$work/inputs" -type f | wc -l)
+differ=$(find "$work/differences" -type f | wc -l)
+if [ "$differ" -gt 0 ]; then cat "$work/differences"/*; fi
 echo "$checked inputs, $differ differ (base $rev)"
 [ "$differ" -eq 0 ]

@@ -34,7 +34,6 @@
 #include "ui/nhapsdo.h"
 #include "ui/runthread.h"
 #include "ui/settings.h"
-#include "ui/survey_of.h"
 #include "ui/texts.h"
 #include "ui/timthay.h"
 
@@ -170,7 +169,7 @@ void MainWindow::bando_Click() {
   if (!bando_->isEnabled()) return;
   MapWindow& map = mapWindow();
   if (mapStale_) {
-    map.setSurvey(SurveyOf(st_), st_.filesl, Ticked(st_.fsdo) ? st_.daufile + ".sdo" : "");
+    map.setSurvey(lastRun_.survey, st_.filesl, Ticked(st_.fsdo) ? st_.daufile + ".sdo" : "");
     mapStale_ = false;
   }
   map.show();

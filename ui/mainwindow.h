@@ -9,7 +9,7 @@
 #include <memory>
 
 #include "core/host.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "core/state.h"
 #include "ui/ask.h"
 #include "ui/dialog.h"

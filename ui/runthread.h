@@ -7,7 +7,7 @@
 #include <functional>
 
 #include "core/host.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "core/state.h"
 
 namespace kavu::ui {

@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "core/lines.h"
-#include "core/run.h"
+#include "run/run.h"
 #include "core/text.h"
 #include "support.h"
 

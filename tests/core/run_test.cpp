@@ -1,11 +1,13 @@
-#include "core/run.h"
+#include "run/run.h"
 
 #include <gtest/gtest.h>
 
 #include <filesystem>
+#include <sstream>
 #include <string>
 
 #include "core/messages.h"
+#include "core/text.h"
 #include "support.h"
 
 namespace kavu {
@@ -65,6 +67,61 @@ TEST(Run, EveryRecordKindGivesTheHandCheckedProducts) {
   EXPECT_EQ(host.titles.back(), msg::kProgramTitle);
   EXPECT_EQ(host.beeps, 1);
   EXPECT_EQ(host.kind, 0);
+}
+
+// The typed result holds what the products show: the report's lines in order,
+// each detail point at the coordinates of the coordinate text file.
+TEST(Run, SurveyHoldsWhatTheProductsShow) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "data");
+  fs::copy_file(kEveryRecord / "job.asc", folder / "data" / "job.asc");
+  RunState st = StateFor(folder / "data" / "job.asc");
+  RecordingHost host;
+  const Survey survey = tinh_Click(st, host).survey;
+
+  std::vector<std::string> reportLines;
+  std::istringstream err(FileBytes(kEveryRecord / "expected" / "job.err"));
+  for (std::string line; std::getline(err, line);) {
+    if (line.size() > 1 && !line.starts_with("  "))
+      reportLines.push_back(line.substr(0, line.size() - 1));
+  }
+  std::vector<std::string> entries;
+  for (const ReportEntry& entry : survey.report) entries.push_back(entry.text);
+  EXPECT_EQ(entries, reportLines);
+  ASSERT_FALSE(survey.report.empty());
+  EXPECT_EQ(survey.report.front().point, "JUNK");
+  EXPECT_EQ(survey.report.front().line, 4u);
+
+  std::istringstream txt(FileBytes(kEveryRecord / "expected" / "job.txt"));
+  std::size_t k = 0;
+  for (std::string line; std::getline(txt, line);) {
+    while (k < survey.points.size() && survey.points[k].kind != PointKind::Detail) ++k;
+    ASSERT_LT(k, survey.points.size()) << line;
+    const ComputedPoint& point = survey.points[k++];
+    std::istringstream fields(line.substr(5));
+    double x = 0, y = 0;
+    fields >> x >> y;
+    EXPECT_EQ(point.name.substr(0, 5), Trim(line.substr(0, 5)));
+    EXPECT_EQ(point.x, x) << line;
+    EXPECT_EQ(point.y, y) << line;
+    EXPECT_LT(point.station, survey.stations.size());
+  }
+  ASSERT_EQ(survey.stations.size(), 6u);
+  EXPECT_EQ(survey.stations[0].station.name, "KC1");
+  EXPECT_EQ(survey.stations[0].orientation.name, "KC2");
+  EXPECT_EQ(survey.stations[0].bearing, 180);
+  EXPECT_EQ(survey.stations[0].orientationDistance, 100);
+  EXPECT_EQ(survey.stations[0].line, 8u);
+  EXPECT_EQ(survey.control.front().name, "KC1");
+  // The check sight on KC3, and the pegs among the points, in field-book order.
+  ASSERT_TRUE(survey.stations[0].check);
+  EXPECT_EQ(survey.stations[0].check->name, "KC3");
+  EXPECT_TRUE(survey.stations[0].checkResidual);
+  std::vector<std::string> pegs;
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind == PointKind::Peg) pegs.push_back(point.name);
+  }
+  EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
 
 // The regenerated field book is itself a field book: computing it again

@@ -4,24 +4,18 @@
 
 #include <cmath>
 
-#include "core/lines.h"
-#include "support.h"
 
 namespace kavu {
 namespace {
 
-// The error report of a state, collected in a file of the test's own.
+// The error report of a state, as the lines after the report's head.
 struct Fixture {
   RunState st;
-  std::filesystem::path report;
-  Fixture() {
-    report = testing::FreshFolder() / "report.err";
-    st.errFile.open(report);
-    st.TenDiem = "P7";
-  }
-  std::string Report() {
-    st.errFile.close();
-    return testing::FileBytes(report);
+  Fixture() { st.TenDiem = "P7"; }
+  std::string Report() const {
+    std::string text;
+    for (const ReportEntry& entry : st.survey.report) text += "\r\n" + entry.text + "\r\n";
+    return text;
   }
 };
 

@@ -85,7 +85,7 @@ TEST(CheckAndConvert, KindComesFromTheExtensionUnlessOverriddenAndHeaderIsCut) {
   st.nhapsdo[1] = "sketch number longer than six";
   const auto lines = CheckAndConvert(st, host);
   ASSERT_TRUE(lines);
-  EXPECT_EQ(*lines, std::vector<std::string>{"TR A 1.5"});
+  EXPECT_EQ(SplitLines(*lines), std::vector<std::string>{"TR A 1.5"});
   EXPECT_EQ(st.filesl, (folder / "job.asc").string());
   EXPECT_EQ(host.fileBox, st.filesl);
   EXPECT_EQ(st.cbkieu, 0);
@@ -96,7 +96,7 @@ TEST(CheckAndConvert, KindComesFromTheExtensionUnlessOverriddenAndHeaderIsCut) {
   RunState told;
   told.txtfile = (folder / "job.TXT").string();
   told.kindOverride = 0;
-  EXPECT_EQ(*CheckAndConvert(told, host), std::vector<std::string>{"anything"});
+  EXPECT_EQ(SplitLines(*CheckAndConvert(told, host)), std::vector<std::string>{"anything"});
 }
 
 }  // namespace

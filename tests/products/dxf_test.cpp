@@ -11,6 +11,14 @@ using testing::Expected;
 using testing::FileBytes;
 using testing::FreshFolder;
 
+ComputedPoint Detail(const std::string& name, double x, double y) {
+  ComputedPoint point;
+  point.name = name;
+  point.x = x;
+  point.y = y;
+  return point;
+}
+
 RunState DrawingState(const std::string& tyle, const std::string& htext) {
   RunState st;
   st.daufile = (FreshFolder() / "JOB1").string();
@@ -31,15 +39,13 @@ TEST(Dxf, ControlAndDetailPointsWithTheirLabels) {
                      {"P1", "2345678.123", "567890.456", "12.5"},
                      {"ABCDEFGHIJKL", "0.5", "-0.25", ""},
                      {"BAD", "abc", "", ""}};
-  st.MangToaDoChiTiet = {{"15          ", "2345678.123", "567890.456", "12.345", "N", ""},
-                         {"            ", "2345700.001", "567900.999", "", "", ""},
-                         {"C\xacng       ", "-12.5", "7", "", "", ""},
-                         {"ABCDEFGHIJKL", "1E3", "2D2", "", "", ""}};
+  st.survey.points = {Detail("15", 2345678.123, 567890.456), Detail("", 2345700.001, 567900.999),
+                      Detail("C\xacng", -12.5, 7), Detail("ABCDEFGHIJKL", 1E3, 2E2)};
+  // A peg is drawn among the control points, never as a detail point.
+  st.survey.points.push_back(Detail("CP", 1, 2));
+  st.survey.points.back().kind = PointKind::Peg;
   ASSERT_TRUE(indxf(st));
   EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/control_and_detail.dxf"));
-  // The last point drawn stays in X and Y.
-  EXPECT_EQ(st.X, 1000);
-  EXPECT_EQ(st.Y, 200);
 }
 
 TEST(Dxf, NoPointsGivesSectionAndEndOnly) {
@@ -51,7 +57,7 @@ TEST(Dxf, NoPointsGivesSectionAndEndOnly) {
 // A height that is not a number makes h = 0: labels of height 0 on the point.
 TEST(Dxf, HeightNotANumberPutsLabelsOnThePoint) {
   RunState st = DrawingState("500", "mm");
-  st.MangToaDoChiTiet = {{"7           ", "100.25", "200.75", "", "", ""}};
+  st.survey.points = {Detail("7", 100.25, 200.75)};
   ASSERT_TRUE(indxf(st));
   EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf"));
 }
@@ -59,7 +65,7 @@ TEST(Dxf, HeightNotANumberPutsLabelsOnThePoint) {
 TEST(Dxf, ScaleNotANumberOrOutOfRangeGivesHeightZero) {
   for (const auto& [tyle, htext] : {std::pair{"", "2.0"}, std::pair{"1D300", "1D300"}}) {
     RunState st = DrawingState(tyle, htext);
-    st.MangToaDoChiTiet = {{"7           ", "100.25", "200.75", "", "", ""}};
+    st.survey.points = {Detail("7", 100.25, 200.75)};
     ASSERT_TRUE(indxf(st));
     EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf")) << tyle;
   }

@@ -3,7 +3,8 @@
 #include <gtest/gtest.h>
 
 #include "core/host.h"
-#include "core/run.h"
+#include "core/station.h"
+#include "run/run.h"
 #include "tests/products/product_files.h"
 
 namespace kavu {
@@ -56,7 +57,6 @@ RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
 TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
   RunState st = PegState(folder, 1, 1);
-  st.errFile.open(folder / "JOB1.err");
 
   WritePegFileHead(st);
   EXPECT_EQ(st.TenKC.str(), "\xa7\xd3i1        ");
@@ -76,11 +76,10 @@ TEST(Pegs, HeadAndStationBlocks) {
   EXPECT_EQ(st.err, 2);
 
   ASSERT_TRUE(st.cpFile.close());
-  ASSERT_TRUE(st.errFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
-  EXPECT_EQ(FileBytes(folder / "JOB1.err"),
-            "\r\nDiem M7           nhap sai phan do\r\n"
-            "\r\nDiem M9           nhap sai phan do\r\n");
+  ASSERT_EQ(st.survey.report.size(), 2u);
+  EXPECT_EQ(st.survey.report[0].text, "Diem M7           nhap sai phan do");
+  EXPECT_EQ(st.survey.report[1].text, "Diem M9           nhap sai phan do");
 }
 
 TEST(Pegs, HeadWithoutHeights) {
@@ -130,7 +129,8 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
                       "3 1800000 20 900000 1.5\r\n");
   QuietHost host;
   RunState first = RunOn(book);
-  ASSERT_EQ(tinh_Click(first, host).outcome, RunOutcome::Completed);
+  const RunResult firstRun = tinh_Click(first, host);
+  ASSERT_EQ(firstRun.outcome, RunOutcome::Completed);
   ASSERT_EQ(first.err, 0);
   ASSERT_EQ(first.sdkc(), 3);  // ST1, DH1 and the peg CP5
   const KnownPoint peg = first.MangKhongChe[2];
@@ -149,10 +149,13 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   RunState second = RunOn(again);
   second.ckKC = 1;
   second.txtFKC = (folder / "JOB1.cp").string();
-  ASSERT_EQ(tinh_Click(second, host).outcome, RunOutcome::Completed);
+  const RunResult secondRun = tinh_Click(second, host);
+  ASSERT_EQ(secondRun.outcome, RunOutcome::Completed);
   EXPECT_EQ(second.err, 0);
-  ASSERT_EQ(second.sdtd(), 1);
-  EXPECT_EQ(second.MangToaDoChiTiet[0], first.MangToaDoChiTiet[0]);
+  ASSERT_EQ(secondRun.survey.points.size(), 1u);
+  EXPECT_EQ(secondRun.survey.points[0].x, firstRun.survey.points[0].x);
+  EXPECT_EQ(secondRun.survey.points[0].y, firstRun.survey.points[0].y);
+  EXPECT_EQ(secondRun.survey.points[0].z, firstRun.survey.points[0].z);
 
   // As a field book: the peg comes back as a detail point at its place. The
   // block's station line carries no instrument height, which the run reports,
@@ -160,14 +163,15 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   const auto asBook = folder / "JOB3.asc";
   testing::WriteBytes(asBook, cp);
   RunState third = RunOn(asBook);
-  ASSERT_EQ(tinh_Click(third, host).outcome, RunOutcome::Completed);
+  const RunResult thirdRun = tinh_Click(third, host);
+  ASSERT_EQ(thirdRun.outcome, RunOutcome::Completed);
   EXPECT_EQ(third.err, 1);
-  ASSERT_EQ(third.sdtd(), 1);
-  const DetailPoint& point = third.MangToaDoChiTiet[0];
-  EXPECT_EQ(Trim(point[0]), "CP5");
-  EXPECT_EQ(point[1], peg[1]);
-  EXPECT_EQ(point[2], peg[2]);
-  EXPECT_EQ(point[3], "11.000    ");
+  ASSERT_EQ(thirdRun.survey.points.size(), 1u);
+  const ComputedPoint& point = thirdRun.survey.points[0];
+  EXPECT_EQ(point.name, "CP5");
+  EXPECT_EQ(NorthingText(point.x), Trim(peg[1]));
+  EXPECT_EQ(EastingText(point.y), Trim(peg[2]));
+  EXPECT_EQ(HeightText(point.z), "11.000");
   EXPECT_EQ(peg[3], "12.450    ");
 }
 

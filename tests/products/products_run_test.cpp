@@ -1,8 +1,8 @@
 #include <gtest/gtest.h>
 
 #include "core/host.h"
-#include "core/run.h"
 #include "core/tcvn3.h"
+#include "run/run.h"
 #include "tests/products/product_files.h"
 
 namespace kavu {

@@ -1,22 +1,22 @@
-#include "core/run.h"
+#include "run/run.h"
 
 #include <algorithm>
 #include <ctime>
 #include <filesystem>
 #include <string>
 
+#include "core/control_points.h"
+#include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/paths.h"
-#include "core/reports.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
 #include "import/dispatch.h"
-#include "products/control_points.h"
 #include "products/dxf.h"
-#include "products/lookup.h"
 #include "products/pegs.h"
+#include "products/reports.h"
 #include "products/sketch.h"
 
 namespace kavu {
@@ -52,8 +52,10 @@ class WorkingCopy {
   long long LinesRead() const { return static_cast<long long>(next_); }
   long long Lines() const { return static_cast<long long>(st_.tamsl.size()); }
   void ReadLine() {
-    st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
-    st_.MangTruong = SplitFields(st_.dong);
+    st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
+    // Each line is read once: it leaves the working copy.
+    st_.dong = AtEnd() ? std::string() : std::move(st_.tamsl[next_++]);
+    SplitFields(st_.dong, st_.MangTruong);
     st_.stp = static_cast<int>(st_.MangTruong.size());
   }
 
@@ -95,7 +97,8 @@ void HandleBodyRecord(RunState& st) {
   }
   const std::string name = Trim(st.TenDiem.str());
   if (stp < 5 && name != "TR" && name != "DKD") {
-    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether));
+    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether),
+                st.TenDiem.str());
   }
 }
 
@@ -104,12 +107,23 @@ struct Counters {
   long long bodyRecords = 0;
 };
 
-void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& counters) {
+void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& counters,
+                    std::size_t recordLine) {
   host.SetTitle(std::string(msg::kStationTitle) + Tcvn3ToUtf8(st.TenTram.str()));
   ++counters.stations;
   TinhPhuongViCanh(st);
   st.cdhdau = RoundEven(st.cdh, 3);
   st.pvd = st.gpv;
+  StationResult station;
+  station.station = {Trim(st.TenTram.str()), st.xTR, st.yTR, std::nullopt};
+  if (!Trim(st.StZTram).empty() && Ticked(st.fdc)) station.station.h = st.zTR;
+  station.orientation = {Trim(st.TenDinhHuong.str()), st.xDKD, st.yDKD, std::nullopt};
+  if (!Trim(st.StZDinhHuong).empty() && Ticked(st.fdc)) station.orientation.h = st.zDKD;
+  // gpv is the azimuth from the orientation point to the station.
+  station.bearing = st.gpv >= 180 ? st.gpv - 180 : st.gpv + 180;
+  station.orientationDistance = st.cdhdau;
+  station.line = recordLine;
+  st.survey.stations.push_back(std::move(station));
   st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
   if (Ticked(st.fsdo)) {
     st.TenDinhHuong2 = "";
@@ -147,7 +161,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   incocphu(st);
 }
 
-void SkipStation(RunState& st, WorkingCopy& copy) {
+void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   st.dctdau = 1;
   while (st.Field(0) != "TR" && !copy.AtEnd()) {
     copy.ReadLine();
@@ -160,8 +174,29 @@ void SkipStation(RunState& st, WorkingCopy& copy) {
     }
     st.TenDiem = st.Field(0);
   }
-  st.errFile.Line(std::string(msg::kSkippedFrom) + st.DiemDau.str() + std::string(msg::kSkippedTo) +
-                  st.DiemCuoi.str() + std::string(msg::kSkippedEnd));
+  const std::string line = std::string(msg::kSkippedFrom) + st.DiemDau.str() +
+                           std::string(msg::kSkippedTo) + st.DiemCuoi.str() +
+                           std::string(msg::kSkippedEnd);
+  st.survey.report.push_back({line, std::string(), stationLine, false});
+}
+
+// The coordinates the lookup found, in numbers and as texts; none (and I = 0)
+// when it found nothing.
+void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& textX,
+                  std::string& textY, std::string& textZ) {
+  if (st.n != 0) {
+    x = st.X;
+    y = st.Y;
+    z = st.Z;
+    textX = st.StX.str();
+    textY = st.StY.str();
+    textZ = st.StZ.str();
+  } else {
+    st.I = 0;
+    textX.clear();
+    textY.clear();
+    textZ.clear();
+  }
 }
 
 // Station and orientation records of a block; I = 0 when it cannot be computed.
@@ -176,28 +211,18 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     st.DongTram = st.TenKC.str();
     // A height that is no number is as good as none: computed with 0.
     if (!HasNumber(st.ccm)) {
-      ReportError(
-          st, std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight));
+      ReportError(st,
+                  std::string(msg::kPoint) + st.TenKC.str() + std::string(msg::kNoInstrumentHeight),
+                  st.TenKC.str());
     }
     TimToaDoDiem(st);
     st.TenTram = st.TenKC.str();
-    if (st.n != 0) {
-      st.xTR = st.X;
-      st.yTR = st.Y;
-      st.zTR = st.Z;
-      st.StXTram = st.StX.str();
-      st.StYTram = st.StY.str();
-      st.StZTram = st.StZ.str();
-    } else {
-      st.I = 0;
-      st.StXTram.clear();
-      st.StYTram.clear();
-      st.StZTram.clear();
-    }
+    TakeLookedUp(st, st.xTR, st.yTR, st.zTR, st.StXTram, st.StYTram, st.StZTram);
   } else {
     st.I = 0;
-    ReportError(
-        st, std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether));
+    ReportError(st,
+                std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether),
+                st.Field(0));
   }
 
   copy.ReadLine();
@@ -207,23 +232,12 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);
     st.TenDinhHuong = st.TenKC.str();
-    if (st.n != 0) {
-      st.xDKD = st.X;
-      st.yDKD = st.Y;
-      st.zDKD = st.Z;
-      st.StXDinhHuong = st.StX.str();
-      st.StYDinhHuong = st.StY.str();
-      st.StZDinhHuong = st.StZ.str();
-    } else {
-      st.I = 0;
-      st.StXDinhHuong.clear();
-      st.StYDinhHuong.clear();
-      st.StZDinhHuong.clear();
-    }
+    TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
   } else {
     st.I = 0;
-    ReportError(st, std::string(msg::kPointColon) + st.Field(0) +
-                        std::string(msg::kOrientationRunTogether));
+    ReportError(
+        st, std::string(msg::kPointColon) + st.Field(0) + std::string(msg::kOrientationRunTogether),
+        st.Field(0));
   }
 }
 
@@ -250,19 +264,12 @@ void RemoveProduct(const RunState& st, const std::string& path) {
   std::filesystem::remove(PathFromUtf8(path), ignored);
 }
 
-// A station record that the station loop can reach: on any line but the last.
-bool HasStationRecord(const std::vector<std::string>& tamsl) {
-  if (tamsl.size() < 2) return false;
-  return std::any_of(tamsl.begin(), tamsl.end() - 1, [](const std::string& line) {
-    return line.starts_with("TR") && line.find(' ') != std::string::npos;
-  });
-}
-
 RunResult Finish(RunState& st, RunOutcome outcome) {
   RunResult result;
   result.outcome = outcome;
   result.err = st.err;
   result.unwritable = st.unwritable;
+  result.survey = std::move(st.survey);
   return result;
 }
 
@@ -284,7 +291,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   const std::string startTime = TimeOfDay();
 
   FileLock jobLock;
-  const auto fieldBook = CheckAndConvert(st, host, &jobLock);
+  auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
 
   st.Tyle = st.TyleTXT;
@@ -296,7 +303,6 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.fcp)) OpenKeptFile(st, st.cpFile, st.daufile + ".cp");
   if (Ticked(st.fsdo)) OpenKeptFile(st, st.sdoFile, st.daufile + ".sdo");
   OpenKeptFile(st, st.errFile, st.daufile + ".err");
-  WriteErrorReportHeader(st.errFile);
   for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
@@ -304,10 +310,13 @@ RunResult tinh_Click(RunState& st, Host& host) {
     AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
+  // The working copy holds all the run reads of the field book from here on.
+  fieldBook.reset();
+  WritePegFileHead(st);
   st.ChuoiKC.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
-  if (!HasStationRecord(st.tamsl)) {
+  if (st.tamsl.empty()) {
     host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
     st.txtfile.clear();
     host.SetFileBox("");
@@ -321,13 +330,17 @@ RunResult tinh_Click(RunState& st, Host& host) {
   copy.ReadLine();
   while (!copy.AtEnd() && !host.Cancelled()) {
     host.Progress(copy.LinesRead(), copy.Lines());
+    const std::size_t stationLine = st.line;
     ReadStationHeader(st, copy);
     if (st.I != 0) {
-      ComputeStation(st, host, copy, counters);
+      ComputeStation(st, host, copy, counters, stationLine);
     } else {
-      SkipStation(st, copy);
+      SkipStation(st, copy, stationLine);
     }
   }
+  // Every line of the working copy has been read.
+  st.tamsl = {};
+  st.tamslLine = {};
   // Stopped by the user: as a run that stops early, nothing is written.
   if (host.Cancelled()) {
     AbandonKeptFiles(st);
@@ -343,6 +356,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
     CommitKeptFile(st, st.cpvFile);
+    WriteErrorReport(st.errFile, st.survey.report);
     CommitKeptFile(st, st.errFile);
   }
   WriteTextProducts(st);

@@ -8,7 +8,10 @@ namespace kavu {
 // The descriptive-words test on field 5 (trims it in MangTruong).
 bool DescriptiveWords(RunState& st);
 
-void GhiMangToaDoChiTiet(RunState& st);
+// The code and note of the current detail record, as the coordinate text
+// file shows them.
+std::pair<std::string, std::string> CodeAndNote(RunState& st);
+
 void GhiMangSoLieuToaDo(RunState& st);
 void GhiMangSoLieuVaoSoDo(RunState& st);
 

@@ -1,4 +1,4 @@
-#include "products/control_points.h"
+#include "core/control_points.h"
 
 #include <filesystem>
 #include <system_error>
@@ -8,7 +8,6 @@
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
-#include "products/pegs.h"
 
 namespace kavu {
 namespace {
@@ -16,9 +15,9 @@ namespace {
 // One line as both passes read it: surrounding spaces removed, blank lines
 // skipped, the rest normalised and split. False for a blank line.
 bool ReadRecord(std::string_view raw, std::string& line, std::vector<std::string>& fields) {
-  line = Trim(raw);
+  line.assign(TrimView(raw));
   if (line.empty()) return false;
-  fields = SplitFields(line);
+  SplitFields(line, fields);
   return true;
 }
 
@@ -32,14 +31,20 @@ void AddControlPoint(RunState& st, const std::vector<std::string>& fields) {
   st.MangKhongChe.push_back({fields[1], fields[2], fields[3], withHeight ? fields[4] : ""});
 }
 
+// A record the station loop starts a station at.
+bool IsStationRecord(std::string_view line) {
+  return line.starts_with("TR") && line.find(' ') != std::string_view::npos;
+}
+
 }  // namespace
 
-bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& fieldBook) {
+bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
   const bool commonFile = Ticked(st.ckKC);
   std::string line;
   std::vector<std::string> fields;
   st.MangKhongChe.clear();
   st.tamsl.clear();
+  st.tamslLine.clear();
   if (commonFile) {
     const std::string path = Trim(st.txtFKC);
     if (path.empty()) {
@@ -52,28 +57,48 @@ bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& f
       host.MessageBox(std::string(msg::kNotDataFile) + path, MsgIcon::Critical, MsgButtons::Ok);
       return false;
     }
-    const auto lines = ReadLines(path);
-    if (!lines) {
+    const auto bytes = ReadFileBytes(path);
+    if (!bytes) {
       host.MessageBox(std::string(msg::kCannotOpen) + path, MsgIcon::Critical, MsgButtons::Ok);
       return false;
     }
     host.SetTitle(msg::kReadingControlFile);
-    for (const std::string& raw : *lines) {
+    st.line = 0;
+    LineReader reader(*bytes);
+    for (std::string_view raw; reader.Next(raw);) {
       if (ReadRecord(raw, line, fields) && IsControlRecord(fields)) AddControlPoint(st, fields);
     }
     host.SetTitle(msg::kReadingData);
   }
   host.SetTitle(msg::kFindingControlPoints);
-  for (const std::string& raw : fieldBook) {
+  // First the control points, and whether a station record stands on any line
+  // of the working copy but its last: a book without one is not kept.
+  bool stationSeen = false;
+  bool reachable = false;
+  std::size_t number = 0;
+  LineReader reader(fieldBook);
+  for (std::string_view raw; reader.Next(raw);) {
+    ++number;
     if (!ReadRecord(raw, line, fields)) continue;
+    st.line = number;
     if (IsControlRecord(fields)) {
       // With a common file the field book's own control points are ignored.
       if (!commonFile) AddControlPoint(st, fields);
     } else {
-      st.tamsl.push_back(line);
+      reachable = reachable || stationSeen;
+      stationSeen = stationSeen || IsStationRecord(line);
     }
   }
-  WritePegFileHead(st);
+  st.line = 0;
+  if (!reachable) return true;
+  number = 0;
+  reader = LineReader(fieldBook);
+  for (std::string_view raw; reader.Next(raw);) {
+    ++number;
+    if (!ReadRecord(raw, line, fields) || IsControlRecord(fields)) continue;
+    st.tamsl.push_back(line);
+    st.tamslLine.push_back(number);
+  }
   return true;
 }
 

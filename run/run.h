@@ -7,6 +7,7 @@
 
 #include "core/host.h"
 #include "core/state.h"
+#include "core/survey.h"
 
 namespace kavu {
 
@@ -25,6 +26,7 @@ struct RunResult {
   std::string startTime, endTime;       // HH:MM:SS
   std::vector<std::string> unwritable;  // products that could not be written
   MsgAnswer answer = MsgAnswer::Ok;     // the answer to the closing question
+  Survey survey;                        // what the run computed and reported
 };
 
 // The summary's lines (UTF-8), without the empty line and the question.

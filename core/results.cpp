@@ -1,4 +1,4 @@
-#include "products/results.h"
+#include "core/results.h"
 
 #include "core/angles.h"
 #include "core/numbers.h"
@@ -17,11 +17,9 @@ bool DescriptiveWords(RunState& st) {
   return KTraCCG(code) == 0 || code.size() <= 2;
 }
 
-void GhiMangToaDoChiTiet(RunState& st) {
+std::pair<std::string, std::string> CodeAndNote(RunState& st) {
   const bool words = (st.stp == 6 || st.stp == 7) && DescriptiveWords(st);
-  st.MangToaDoChiTiet.push_back({st.TenDiem.str(), st.StX.str(), st.StY.str(), st.StZ.str(),
-                                 words ? st.Field(5) : std::string(),
-                                 words && st.stp == 7 ? st.Field(6) : std::string()});
+  return {words ? st.Field(5) : std::string(), words && st.stp == 7 ? st.Field(6) : std::string()};
 }
 
 void GhiMangSoLieuToaDo(RunState& st) {

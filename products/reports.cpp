@@ -1,4 +1,4 @@
-#include "core/reports.h"
+#include "products/reports.h"
 
 #include <algorithm>
 #include <filesystem>
@@ -7,24 +7,29 @@
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/paths.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
 
-void WriteErrorReportHeader(TextOut& out) {
+void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report) {
   out.Line(msg::kErrHeader1);
   out.Line(msg::kErrHeader2);
+  for (const ReportEntry& entry : report) {
+    if (entry.counted) out.Line("");
+    out.Line(entry.text);
+  }
 }
 
 void WriteStationListingHeader(TextOut& out) {
   for (std::string_view line : msg::kCpvHeader) out.Line(line);
 }
 
-std::string CoordinateTextLine(const RunState& st, int k, int decimals) {
-  const DetailPoint& p = st.MangToaDoChiTiet[static_cast<std::size_t>(k)];
-  const std::string height = NumberColumn(NumberText(RoundEven(Val(p[3]), decimals)), 10);
-  return FixedWidth(p[0].substr(0, 5), 5) + " " + NumberWidth(p[1], 11) + " " +
-         NumberWidth(p[2], 10) + " " + height + " " + p[4] + " " + p[5];
+std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {
+  const std::string height =
+      NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
+  return FixedWidth(p.name, 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
+         NumberWidth(EastingText(p.y), 10) + " " + height + " " + p.code + " " + p.note;
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {
@@ -78,7 +83,9 @@ void WriteTextProducts(RunState& st) {
   if (Ticked(st.ftd)) {
     const int decimals = HeightDecimals(st.txtSoleDC);
     WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
-      for (int k = 0; k < st.sdtd(); ++k) out.Line(CoordinateTextLine(st, k, decimals));
+      for (const ComputedPoint& point : st.survey.points) {
+        if (point.kind == PointKind::Detail) out.Line(CoordinateTextLine(point, decimals));
+      }
     });
   }
 }

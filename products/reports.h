@@ -7,7 +7,9 @@
 
 namespace kavu {
 
-void WriteErrorReportHeader(TextOut& out);
+// The error report (.err): its head, then each message, an error set off by
+// an empty line.
+void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report);
 void WriteStationListingHeader(TextOut& out);
 
 // True when the product at path would replace a file the run reads: it is
@@ -18,7 +20,7 @@ bool ProductOverInput(RunState& st, const std::string& path);
 // its .td1, the .txt. Unwritable ones are added to st.unwritable.
 void WriteTextProducts(RunState& st);
 
-// A line of the coordinate text file for computed point k (from 0).
-std::string CoordinateTextLine(const RunState& st, int k, int decimals);
+// A line of the coordinate text file for a computed detail point.
+std::string CoordinateTextLine(const ComputedPoint& point, int decimals);
 
 }  // namespace kavu
