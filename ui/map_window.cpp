@@ -20,22 +20,10 @@
 #include "core/messages.h"
 #include "ui/ask.h"
 #include "ui/sketch_pdf.h"
+#include "ui/texts.h"
 
 namespace kavu::ui {
 namespace {
-
-constexpr std::string_view kMapTitle = "Bản đồ: ";
-constexpr std::string_view kFit = "Vừa cửa sổ";
-constexpr std::string_view kSaveView = "Lưu hình đang xem";
-constexpr std::string_view kSaveWhole = "Lưu hình cả khu đo";
-constexpr std::string_view kSaveSketch = "Lưu sổ đo PDF";
-constexpr std::string_view kPrintSketch = "In sổ đo";
-constexpr std::string_view kPictureFilter = "Hình PNG (*.png);;Hình SVG (*.svg)";
-constexpr std::string_view kPdfFilter = "File PDF (*.pdf)";
-constexpr std::string_view kReportLines = "Báo lỗi:";
-constexpr std::string_view kRecordAt = "Sổ đo, dòng ";
-constexpr std::string_view kHint = "Bấm vào một điểm để xem số liệu của nó.";
-constexpr std::string_view kKinds[] = {"Điểm khống chế", "Trạm máy", "Cọc phụ", "Điểm chi tiết"};
 
 // A drag shorter than this is a click.
 constexpr int kClickSlack = 4;
@@ -189,7 +177,7 @@ std::string MapWindow::bookLine(std::size_t line) {
 QString MapWindow::describe(std::size_t index) {
   const MapItem& item = canvas_->model().items.at(index);
   QStringList text;
-  text << item.name + QStringLiteral("  (") + Q(kKinds[static_cast<int>(item.kind)]) +
+  text << item.name + QStringLiteral("  (") + Q(kPointKinds[static_cast<int>(item.kind)]) +
               QStringLiteral(")  X= ") + QString::number(item.x, 'f', 3) + QStringLiteral("  Y= ") +
               QString::number(item.y, 'f', 3);
   const std::string name = nameOf(item);

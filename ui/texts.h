@@ -106,4 +106,19 @@ inline constexpr std::string_view kReplace = "Thay thế";
 inline constexpr std::string_view kReplaceAll = "Thay tất cả";
 inline constexpr std::string_view kNotFoundAgain = "Không tìm thấy! Có tìm tiếp không";
 
+// The map window.
+inline constexpr std::string_view kMapTitle = "Bản đồ: ";
+inline constexpr std::string_view kFit = "Vừa cửa sổ";
+inline constexpr std::string_view kSaveView = "Lưu hình đang xem";
+inline constexpr std::string_view kSaveWhole = "Lưu hình cả khu đo";
+inline constexpr std::string_view kSaveSketch = "Lưu sổ đo PDF";
+inline constexpr std::string_view kPrintSketch = "In sổ đo";
+inline constexpr std::string_view kPictureFilter = "Hình PNG (*.png);;Hình SVG (*.svg)";
+inline constexpr std::string_view kPdfFilter = "File PDF (*.pdf)";
+inline constexpr std::string_view kReportLines = "Báo lỗi:";
+inline constexpr std::string_view kRecordAt = "Sổ đo, dòng ";
+inline constexpr std::string_view kHint = "Bấm vào một điểm để xem số liệu của nó.";
+inline constexpr std::string_view kPointKinds[] = {"Điểm khống chế", "Trạm máy", "Cọc phụ",
+                                                   "Điểm chi tiết"};
+
 }  // namespace kavu::ui
