@@ -41,7 +41,7 @@ sync_sources() {
   git ls-files -z | while IFS= read -r -d '' f; do
     if [[ ! -e "$src/$f" ]] || ! cmp -s "$f" "$src/$f"; then
       mkdir -p "$src/$(dirname "$f")"
-      cp -p "$f" "$src/$f"
+      cp "$f" "$src/$f"  # a fresh time, so that ninja rebuilds it
     fi
   done
 }
@@ -95,7 +95,7 @@ while IFS= read -r line; do
   [[ "$file" == ui/* ]] && ui=ON
   build=$work/build-ui-$ui
   configure "$build" "$ui"
-  cp -p "$top/$file" "$src/$file"
+  cp "$top/$file" "$src/$file"
   targets=(--target kavu_tests kavu-cli)
   [[ $ui == ON ]] && targets=()
   verdict=""
@@ -120,7 +120,7 @@ while IFS= read -r line; do
   else
     verdict="killed"
   fi
-  cp -p "$top/$file" "$src/$file"
+  cp "$top/$file" "$src/$file"
   case $verdict in
     killed) killed=$((killed + 1)) ;;
     survived) survived=$((survived + 1)); survivors+=("$n $file: $old ==> $new") ;;

@@ -11,9 +11,6 @@
 #include <vector>
 
 #include "cli/cli.h"
-#include "core/angles.h"
-#include "core/tcvn3.h"
-#include "core/text.h"
 #include "tests/support.h"
 
 namespace kavu {
@@ -222,61 +219,6 @@ TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
             "DKD KC2\r\n"
             "KC2     00000  100.000   900000    0.0 KC2\r\n"
             "3      450000 1233.953   893000 000001.500 \r\n");
-}
-
-// RString and LString decide on the untrimmed length and pad the trimmed
-// text; a text as long as the width is returned as it stands.
-TEST(Corners, ColumnAlignmentWithBlanks) {
-  struct Case {
-    const char* text;
-    int width;
-    const char* right;
-    const char* left;
-  };
-  for (const Case& c : {Case{"ab  ", 5, "   ab", "ab   "}, Case{" ab ", 5, "   ab", "ab   "},
-                        Case{"ab  ", 4, "ab  ", "ab  "}, Case{"  ab", 4, "  ab", "  ab"},
-                        Case{"abcdef", 4, "abcdef", "abcdef"}, Case{"", 3, "   ", "   "}}) {
-    EXPECT_EQ(RString(c.text, c.width), c.right) << "'" << c.text << "' " << c.width;
-    EXPECT_EQ(LString(c.text, c.width), c.left) << "'" << c.text << "' " << c.width;
-  }
-}
-
-// Seconds are rounded twice: to a tenth, then to the even whole second, so
-// 31.46" becomes 31.5" and then 32", and 30.46" becomes 30".
-TEST(Corners, SecondsRoundedToATenthThenToEven) {
-  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 31.46 / 3600), " 123 45 32");
-  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 30.46 / 3600), " 123 45 30");
-  EXPECT_EQ(GocStringText(-(5 + 59 / 60.0 + 59.96 / 3600)), "  -6 00 00");
-  EXPECT_EQ(GocSt(359.99999), "    00000");  // 359 59 59.96: the carry wraps 360 to 0
-}
-
-// The TCVN3 letters by the standard's rows: the vowels with grave, hook,
-// tilde, acute and dot below, and the letters without tone.
-TEST(Corners, Tcvn3TableOfTheStandard) {
-  struct Row {
-    unsigned first;
-    const char* letters;  // UTF-8, one letter per consecutive byte
-  };
-  const Row rows[] = {
-      {0xA1, "ĂÂÊÔƠƯĐăâêôơưđ"},  {0xB5, "àảãáạ"},          {0xBB, "ằẳẵắ"},
-      {0xC6, "ặầẩẫấậè"},         {0xCE, "ẻẽéẹềểễếệìỉ"},    {0xDC, "ĩíịò"},
-      {0xE1, "ỏõóọồổỗốộờởỡớợù"}, {0xF1, "ủũúụừửữứựỳỷỹýỵ"},
-  };
-  int count = 0;
-  for (const Row& row : rows) {
-    std::string_view letters = row.letters;
-    for (unsigned byte = row.first; !letters.empty(); ++byte, ++count) {
-      const std::size_t size = (static_cast<unsigned char>(letters[0]) >= 0xE0) ? 3 : 2;
-      const std::string letter(letters.substr(0, size));
-      letters.remove_prefix(size);
-      const std::string code(1, static_cast<char>(byte));
-      EXPECT_EQ(Utf8ToTcvn3(letter), code) << letter;
-      EXPECT_EQ(Tcvn3ToUtf8(code), letter) << std::hex << byte;
-    }
-  }
-  EXPECT_EQ(count, 14 + 5 + 4 + 7 + 11 + 4 + 15 + 14);
-  // A capital with a tone mark has no code: the lowercase one stands for it.
-  EXPECT_EQ(Utf8ToTcvn3("ÀẢÃÁẠỲỶỸÝỴ"), "\xB5\xB6\xB7\xB8\xB9\xFA\xFB\xFC\xFD\xFE");
 }
 
 }  // namespace

@@ -24,14 +24,22 @@ TEST(Text, TrimTouchesOnlySpaces) {
   EXPECT_EQ(name.str(), "DC05        ");
 }
 
+// RString and LString decide on the untrimmed length and pad the trimmed
+// text; a text as long as the width or longer is returned as it stands.
 TEST(Text, AlignDecidesOnUntrimmedLengthAndNeverCuts) {
-  EXPECT_EQ(RString("ab", 5), "   ab");
-  EXPECT_EQ(LString("ab", 5), "ab   ");
-  EXPECT_EQ(RString(" ab ", 5), "   ab");
-  EXPECT_EQ(LString(" ab ", 5), "ab   ");
-  EXPECT_EQ(RString("  ab", 4), "  ab");
-  EXPECT_EQ(RString("abcdef", 4), "abcdef");
-  EXPECT_EQ(RString("ab", -1), "ab");
+  struct Case {
+    const char* text;
+    int width;
+    const char* right;
+    const char* left;
+  };
+  for (const Case& c : {Case{"ab", 5, "   ab", "ab   "}, Case{"ab  ", 5, "   ab", "ab   "},
+                        Case{" ab ", 5, "   ab", "ab   "}, Case{"ab  ", 4, "ab  ", "ab  "},
+                        Case{"  ab", 4, "  ab", "  ab"}, Case{"abcdef", 4, "abcdef", "abcdef"},
+                        Case{"", 3, "   ", "   "}, Case{"ab", -1, "ab", "ab"}}) {
+    EXPECT_EQ(RString(c.text, c.width), c.right) << "'" << c.text << "' " << c.width;
+    EXPECT_EQ(LString(c.text, c.width), c.left) << "'" << c.text << "' " << c.width;
+  }
 }
 
 TEST(Text, KTraCCGTrimsAndFlagsOtherCharacters) {
@@ -66,6 +74,11 @@ TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   EXPECT_EQ(GocStringText(359.99999), "   0 00 00");  // carry wraps 360 to 0
   EXPECT_EQ(GocStringText(1000), " 640 00 00");       // 360 taken off once only
   EXPECT_EQ(GocStringText(-0.00001), "  -0 00 00");
+  // Rounded twice: to a tenth, then to the even second (31.46 -> 31.5 -> 32).
+  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 31.46 / 3600), " 123 45 32");
+  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 30.46 / 3600), " 123 45 30");
+  EXPECT_EQ(GocStringText(-(5 + 59 / 60.0 + 59.96 / 3600)), "  -6 00 00");
+  EXPECT_EQ(GocSt(359.99999), "    00000");
   EXPECT_EQ(GocSt(123.7584722), "  1234530");
   EXPECT_EQ(GocSt(-12.5), "  -123000");
   EXPECT_EQ(GocSt(5.0691666667), "    50409");
