@@ -199,15 +199,16 @@ TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
 // A .gre file is an SDR recording: converted with its set-ups, then
 // computed. Every number fills its columns up to the next one, so a column
 // boundary one off changes a value: slope 1234 at zenith 89.5 is 1233.953 m
-// horizontal (1234 x sin 89.5), the reading 45 is 45 00 00, the prism height
-// and the height are kept as recorded.
+// horizontal (1234 x sin 89.5); the reading 45, turned to the backsight read
+// at 45.5, wraps to 359 30 00 and the backsight itself reads 0; the prism
+// height and the height are kept as recorded.
 TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
   const std::string gre =
       "08KI0001  1000.000  1000.0000000010.00          KC1\r\n"
       "08KI0002   900.000  1000.0000000010.00          KC2\r\n"
       "02TP0001                                   1.500\r\n"
       "07TP    0002\r\n"
-      "09F1    000200000001000090.000000000000000\r\n"
+      "09F1    000200000001000090.000000000045.50\r\n"
       "03NM000001.500\r\n"
       "09F1    000300000012340089.500000000000045\r\n";
   const Outcome run = Compute(gre, {"--txt"}, ".gre");
@@ -218,7 +219,7 @@ TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
             "TR KC1 1.500\r\n"
             "DKD KC2\r\n"
             "KC2     00000  100.000   900000    0.0 KC2\r\n"
-            "3      450000 1233.953   893000 000001.500 \r\n");
+            "3     3593000 1233.953   893000 000001.500 \r\n");
 }
 
 }  // namespace

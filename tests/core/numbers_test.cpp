@@ -41,7 +41,8 @@ TEST(Rounding, TiesGoToEven) {
   EXPECT_EQ(RoundEven(0.125, 2), 0.12);  // 12.5 exactly
   EXPECT_EQ(RoundEven(0.375, 2), 0.38);
   EXPECT_EQ(RoundEven(1.26, 1), 1.3);
-  EXPECT_EQ(RoundEven(1e300, 2), 1e300);  // beyond 2^52 left unchanged
+  EXPECT_EQ(RoundEven(2345678.0625, 3), 2345678.062);  // a northing's tie, 2.3E+09 scaled
+  EXPECT_EQ(RoundEven(1e300, 2), 1e300);               // beyond 2^52 left unchanged
   EXPECT_EQ(RoundEvenWhole(-0.5), 0);
   EXPECT_EQ(RoundEvenWhole(-1.5), -2);
   EXPECT_EQ(Fix(-1.7), -1);
@@ -60,6 +61,7 @@ TEST(Mask, HalvesAwayFromZeroAndOptionalDigits) {
   EXPECT_EQ(Mask(0, "#######"), "");
   EXPECT_EQ(Mask(1234.5678, "####0.000"), "1234.568");
   EXPECT_EQ(Mask(0.0005, "####0.000"), "0.001");
+  EXPECT_EQ(Mask(-0.5, "####0.000"), "-0.500");
   EXPECT_EQ(Mask(-12.3456, "#######.000"), "-12.346");
   EXPECT_EQ(Mask(123456789, "####.000"), "123456789.000");
   // Beyond 2^53 the value's own decimal expansion, never a cut or wrapped

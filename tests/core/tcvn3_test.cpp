@@ -47,6 +47,7 @@ TEST(Tcvn3, ProgramTextsAndDecomposedMarks) {
   // A vowel and its combining marks are joined; a stray mark is unknown.
   EXPECT_EQ(Utf8ToTcvn3("To\u0302\u0309ng A\u0301 U\u031B \u0301 e\u0303"),
             "T\xE6ng \xB8 \xA6 ? \xCF");
+  EXPECT_EQ(Utf8ToTcvn3("a\u0302\u0303a\u0302\u0301o\u031Ba\u0306\u0323"), "\xC9\xCA\xAC\xC6");
 }
 
 TEST(Tcvn3, OtherBytesAndInvalidText) {

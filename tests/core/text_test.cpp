@@ -15,7 +15,7 @@ namespace {
 TEST(Text, TrimTouchesOnlySpaces) {
   EXPECT_EQ(Trim("  \ta b\t  "), "\ta b\t");
   EXPECT_EQ(Trim("   "), "");
-  EXPECT_EQ(Upper("kt\xB5z"), "KT\xB5Z");
+  EXPECT_EQ(Upper("akt\xB5z"), "AKT\xB5Z");
   EXPECT_EQ(FixedWidth("abc", 5), "abc  ");
   EXPECT_EQ(FixedWidth("abcdefg", 5), "abcde");
   FixedText<12> name;
@@ -78,6 +78,8 @@ TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 31.46 / 3600), " 123 45 32");
   EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 30.46 / 3600), " 123 45 30");
   EXPECT_EQ(GocStringText(-(5 + 59 / 60.0 + 59.96 / 3600)), "  -6 00 00");
+  EXPECT_EQ(GocStringText(5 + 59 / 60.0 + 59.5 / 3600), "   6 00 00");  // 60" then 60'
+
   EXPECT_EQ(GocSt(359.99999), "    00000");
   EXPECT_EQ(GocSt(123.7584722), "  1234530");
   EXPECT_EQ(GocSt(-12.5), "  -123000");
