@@ -201,11 +201,12 @@ TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
 // boundary one off changes a value: slope 1234 at zenith 89.5 is 1233.953 m
 // horizontal (1234 x sin 89.5); the reading 45, turned to the backsight read
 // at 45.5, wraps to 359 30 00 and the backsight itself reads 0; the prism
-// height and the height are kept as recorded.
+// height and the height are kept as recorded; a description of two
+// characters does not name a point.
 TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
   const std::string gre =
       "08KI0001  1000.000  1000.0000000010.00          KC1\r\n"
-      "08KI0002   900.000  1000.0000000010.00          KC2\r\n"
+      "08KI0002   900.000  1000.0000000010.00          K2\r\n"
       "02TP0001                                   1.500\r\n"
       "07TP    0002\r\n"
       "09F1    000200000001000090.000000000045.50\r\n"
@@ -215,10 +216,10 @@ TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
   EXPECT_EQ(run.code, kExitOk);
   EXPECT_EQ(run.Product(".asc"),
             "TR KC1    1000.000    1000.000 0000010.00\r\n"
-            "TR KC2     900.000    1000.000 0000010.00\r\n"
+            "TR DKC0002     900.000    1000.000 0000010.00\r\n"
             "TR KC1 1.500\r\n"
-            "DKD KC2\r\n"
-            "KC2     00000  100.000   900000    0.0 KC2\r\n"
+            "DKD DKC0002\r\n"
+            "DKC0002    00000  100.000   900000    0.0 DKC0002\r\n"
             "3     3593000 1233.953   893000 000001.500 \r\n");
 }
 
