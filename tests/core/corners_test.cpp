@@ -202,14 +202,15 @@ TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
 // horizontal (1234 x sin 89.5); the reading 45, turned to the backsight read
 // at 45.5, wraps to 359 30 00 and the backsight itself reads 0; the prism
 // height and the height are kept as recorded; a description of two
-// characters does not name a point.
+// characters does not name a point, and a listed backsight keeps its name
+// whatever its observation's note says.
 TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
   const std::string gre =
       "08KI0001  1000.000  1000.0000000010.00          KC1\r\n"
       "08KI0002   900.000  1000.0000000010.00          K2\r\n"
       "02TP0001                                   1.500\r\n"
       "07TP    0002\r\n"
-      "09F1    000200000001000090.000000000045.50\r\n"
+      "09F1    000200000001000090.000000000045.50MOC5\r\n"
       "03NM000001.500\r\n"
       "09F1    000300000012340089.500000000000045\r\n";
   const Outcome run = Compute(gre, {"--txt"}, ".gre");

@@ -2,7 +2,9 @@
 
 #include <gtest/gtest.h>
 
+#include <cctype>
 #include <filesystem>
+#include <string>
 
 #include "support.h"
 
@@ -10,6 +12,11 @@ namespace kavu {
 namespace {
 
 namespace fs = std::filesystem;
+
+std::string Lower(std::string text) {
+  for (char& c : text) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return text;
+}
 
 // The names of a path, native on each system: on Windows with drive letters
 // and backslashes (the system's absolute path gives the TRIDO folder).
@@ -66,10 +73,12 @@ TEST(DeriveFileSelection, ProductsAreNamedAfterTheFileNameOnly) {
 
 TEST(KindOfExtension, UpperCaseExtensionsSelectTheirKindAndPattern) {
   const char* extensions[] = {"ASC", "SDR", "OBS", "SET", "RAW", "IDX", "TCM", "GRE", "DN7"};
-  for (int k = 0; k < 9; ++k) EXPECT_EQ(KindOfExtension(extensions[k]), k);
+  for (int k = 0; k < 9; ++k) {
+    EXPECT_EQ(KindOfExtension(extensions[k]), k);
+    EXPECT_EQ(PatternOfKind(k), "*." + Lower(extensions[k]));
+  }
   EXPECT_EQ(KindOfExtension("sdr"), 9);
   EXPECT_EQ(KindOfExtension("TXT"), 9);
-  EXPECT_EQ(PatternOfKind(6), "*.tcm");
   EXPECT_EQ(PatternOfKind(9), "*.*");
   EXPECT_EQ(PatternOfKind(42), "*.*");
 }

@@ -45,6 +45,19 @@ TEST(ConvertIdx, FileEndingInsideABlockKeepsWhatWasWritten) {
   EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\nEND SLOPE\n" + obs).book, tr + "DKD \r\n");
 }
 
+// Degrees, minutes and seconds: Q at 45.3000 is 45 30 00. P's two faces,
+// 0 10 00 and 179 50 00 at zenith 270 (359 50 00), straddle 0: their mean is
+// 0 00 00, not 180.
+TEST(ConvertIdx, DmsReadingsAndFacesAcrossZero) {
+  const std::string file =
+      "ANGULAR DMS\nSTN_ID \"S\"\nINST_HT 1.5;\n\n\n1,\"B\",1,0,90,10,0\n"
+      "2,\"Q\",1,45.3000,90,10,0\n3,\"P\",1,0.1000,90,10,0\n4,\"P\",1,179.5000,270,10,0\n";
+  EXPECT_EQ(
+      ConvertIdx(file).book,
+      "TR S  1.5 \r\nDKD B\r\nB        00000   10.000   900000      0\r\n"
+      "Q       453000   10.000   900000      0\r\nP        00000   10.000   900000      0\r\n");
+}
+
 TEST(ConvertIdx, NamesPassThroughByteForByte) {
   // TCVN3 letters and a NUL inside quoted names; a long name is not cut.
   const std::string name("\xae\xad\xeang\0x", 6);
