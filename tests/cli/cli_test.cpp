@@ -172,19 +172,6 @@ TEST(CliExe, CleanRunExits0WithTheFiveSummaryLines) {
   EXPECT_FALSE(fs::exists(dir / "TRIDO"));
 }
 
-TEST(Cli, DataErrorsExit1AndKeepTheReport) {
-  const fs::path dir = FreshFolder();
-  std::string book(kSmallBook);
-  book += "3 0450000 20.000\r\n";                // run together: 3 fields
-  book += "4 0450000 -20.000 0900000 1.50\r\n";  // negative distance
-  WriteBytes(dir / "bad.asc", book);
-  const Outcome o = Cli({(dir / "bad.asc").string()});
-  EXPECT_EQ(o.code, kExitDataErrors);
-  ExpectSummary(o, 1, 4, 2);
-  EXPECT_TRUE(fs::exists(dir / "bad.err"));
-  EXPECT_TRUE(fs::exists(dir / "bad.cpv"));
-}
-
 TEST(Cli, UnwritableProductIsNamedAndExits1WhileTheOthersAreWritten) {
   const fs::path dir = FreshFolder();
   fs::create_directories(dir / "job");

@@ -75,6 +75,7 @@ TEST(Corners, OrientationDistanceToleranceOfEveryScale) {
     if (c.ds == nullptr) {
       EXPECT_EQ(run.code, kExitOk) << c.scale << " " << c.measured << err;
     } else {
+      EXPECT_EQ(run.code, kExitDataErrors);
       EXPECT_NE(err.find(std::string("Sai canh dinh huong DS= ") + c.ds + "\r\n"),
                 std::string::npos)
           << c.scale << " " << c.measured << err;

@@ -90,16 +90,6 @@ TEST(NumberText, FifteenDigitsAndNoLeadingZero) {
   EXPECT_EQ(NumberText(-2345678.125), "-2345678.125");
 }
 
-TEST(NumberText, ReportAndCountForms) {
-  EXPECT_EQ(ReportNumber(3), " 3 ");
-  EXPECT_EQ(ReportNumber(-0.12), "-.12 ");
-  EXPECT_EQ(ReportNumber(0), " 0 ");
-  EXPECT_EQ(ReportNumber(-0.0), " 0 ");
-  EXPECT_EQ(SignedCount(12), " 12");
-  EXPECT_EQ(SignedCount(0), " 0");
-  EXPECT_EQ(SignedCount(-3), "-3");
-}
-
 TEST(SplitMix64, MatchesTheReferenceSequence) {
   // First output of SplitMix64 seeded with 0 is 0xE220A8397B1DCDAF.
   SplitMix64 rng(0);

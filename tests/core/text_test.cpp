@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <filesystem>
 
 #include "core/angles.h"
@@ -51,18 +50,6 @@ TEST(Text, KTraCCGTrimsAndFlagsOtherCharacters) {
   EXPECT_EQ(KTraCCG(empty), 0);
 }
 
-TEST(Text, SplitFieldsNormalisesTheLine) {
-  std::string line = "P7\t\t1234530   45.210 \t0901500 1.50";
-  const auto fields = SplitFields(line);
-  EXPECT_EQ(line, "P7 1234530 45.210 0901500 1.50");
-  ASSERT_EQ(fields.size(), 5u);
-  EXPECT_EQ(fields[2], "45.210");
-  std::string tab_first = "\tK1 0";  // only spaces are trimmed before the tabs turn into spaces
-  EXPECT_EQ(SplitFields(tab_first), (std::vector<std::string>{"", "K1", "0"}));
-  std::string empty;
-  EXPECT_TRUE(SplitFields(empty).empty());
-}
-
 TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   AngleParts parts;
   EXPECT_EQ(GocStringText(123.7584722, &parts), " 123 45 30");
@@ -86,13 +73,6 @@ TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   EXPECT_EQ(GocSt(5.0691666667), "    50409");
   EXPECT_EQ(GocSt1(5.0691666667), "  5 04 09");
   EXPECT_EQ(GocSt1(-123.7584722), "-123 45 30");  // 10 characters, not cut
-}
-
-TEST(Angles, CvGocDblReadsPackedColumns) {
-  EXPECT_NEAR(CvGocDbl("1234530"), 123 + 45 / 60.0 + 30 / 3600.0, 1e-12);
-  EXPECT_NEAR(CvGocDbl("450"), 4 / 60.0 + 50 / 3600.0, 1e-12);  // read as 0000450
-  EXPECT_EQ(CvGocDbl(""), 0);
-  EXPECT_TRUE(std::isfinite(CvGocDbl("-99999999999")));
 }
 
 TEST(Lines, EveryLineEndCounts) {

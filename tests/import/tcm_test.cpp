@@ -65,14 +65,6 @@ TEST(ConvertTcm, LookAheadAtTheEnds) {
             "8         895955    10.000    900000    1.50 ABC\r\n");
 }
 
-TEST(ConvertTcm, MoreThan4999RecordsAreAllWritten) {
-  std::string file = "header\r\nST1         1.45\r\n" + Obs("0", "0", "0000", "K2");
-  for (int k = 1; k <= 6000; ++k) file += "\r\n" + Obs(std::to_string(k), "10", "0000");
-  const std::vector<std::string> lines = SplitLines(ConvertTcm(file).book);
-  ASSERT_EQ(lines.size(), 2u + 6001u);
-  EXPECT_EQ(lines.back(), "6000      100000    10.000    900000    1.50 ");
-}
-
 TEST(ConvertTcm, BadInputEndsWithABoundedFieldBook) {
   // Lines shorter than the columns read: a set-up without height, an
   // observation with nothing after its point number.
