@@ -127,17 +127,11 @@ TEST(CliUsage, BadCommandLinesExit64WithoutRunning) {
   EXPECT_EQ(std::distance(fs::directory_iterator(dir), fs::directory_iterator{}), 1);
 }
 
-TEST(CliUsage, HelpNamesTheOptionsAndExitCodes) {
-  const Outcome o = Cli({"--help"});
-  EXPECT_EQ(o.code, kExitOk);
-  for (const char* word : {"--kind", "--no-heights", "--control-file", "Exit status", "  64 "}) {
-    EXPECT_NE(o.out.find(word), std::string::npos) << word;
-  }
-}
-
-// A missing or empty field book stops before the run: the two-line message
-// box on stderr (its lone CR becomes a line feed), and no report.
-TEST(CliExe, MissingOrEmptyFileExits2WithTheMessageOnStderr) {
+// The program itself: a missing or empty field book stops before the run
+// with the two-line message box on stderr (its lone CR a line feed) and no
+// report; a clean run prints the five summary lines, writes only the product
+// asked for and, off a terminal, nothing on stderr.
+TEST(CliExe, ExitCodesAndStreams) {
   const fs::path dir = FreshFolder();
   WriteBytes(dir / "empty.asc", "");
   const std::string missing = (dir / "nothere.asc").string();
@@ -151,20 +145,15 @@ TEST(CliExe, MissingOrEmptyFileExits2WithTheMessageOnStderr) {
     EXPECT_EQ(o.out, "");
     EXPECT_EQ(o.err, message + "\n");
   }
-  EXPECT_FALSE(fs::exists(dir / "nothere.err"));
   EXPECT_FALSE(fs::exists(dir / "empty.err"));
-}
 
-TEST(CliExe, CleanRunExits0WithTheFiveSummaryLines) {
-  const fs::path dir = FreshFolder();
   fs::create_directories(dir / "job");
   WriteBytes(dir / "job" / "small.asc", kSmallBook);
   const Outcome o = Exe({"--txt", (dir / "job" / "small.asc").string()}, dir);
   EXPECT_EQ(o.code, kExitOk) << o.err;
   ExpectSummary(o, 1, 2, 0);
   EXPECT_EQ(SplitLines(o.out).size(), 5u);
-  EXPECT_EQ(o.err, "");  // not a terminal: no progress
-  // Only the product asked for; no errors, so no report and no listing.
+  EXPECT_EQ(o.err, "");
   EXPECT_TRUE(fs::exists(dir / "job" / "small.txt"));
   for (const char* ext : {".err", ".cpv", ".kc", ".td1", ".dxf", ".sdo", ".cp"}) {
     EXPECT_FALSE(fs::exists(dir / "job" / ("small" + std::string(ext)))) << ext;
@@ -186,7 +175,7 @@ TEST(Cli, UnwritableProductIsNamedAndExits1WhileTheOthersAreWritten) {
   EXPECT_TRUE(fs::is_regular_file(dir / "job" / "small.kc"));
 }
 
-// Off a terminal stderr stays empty (CleanRunExits0WithTheFiveSummaryLines).
+// Off a terminal stderr stays empty (CliExe.ExitCodesAndStreams).
 TEST(Cli, ProgressGoesToStderrOnATerminal) {
   const fs::path dir = FreshFolder();
   WriteBytes(dir / "small.asc", kSmallBook);
