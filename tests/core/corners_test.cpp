@@ -185,16 +185,18 @@ TEST(Corners, HeightDecimalsOfTheCoordinateTextFile) {
 }
 
 // --kind overrides the extension; --text-height times the scale / 1000 is
-// the label height in the drawing file (3 mm at 1:500 is 1.5 m).
+// the label height in the drawing file (4 mm at 1:500 is 2 m, and 3 m for
+// the control points' labels, half as high again).
 TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
   const std::string book = Book("1 0 10 900000 1.5\r\n");
   EXPECT_EQ(Compute(book, {"--kind", "0", "--txt"}, ".dat").code, kExitOk);
   EXPECT_EQ(Compute(book, {"--txt"}, ".dat").code, kExitStopped);  // kind 9: job.asc needed
   const Outcome other = Compute(book, {"--kind", "9"}, ".asc");
   EXPECT_EQ(other.code, kExitOk);
-  const Outcome drawing = Compute(book, {"--dxf", "--text-height", "3", "--scale", "500"});
-  EXPECT_NE(drawing.Product(".dxf").find(" 40\r\n 1.5 \r\n"), std::string::npos)
-      << drawing.Product(".dxf");
+  const std::string dxf =
+      Compute(book, {"--dxf", "--text-height", "4", "--scale", "500"}).Product(".dxf");
+  EXPECT_NE(dxf.find(" 40\r\n 2 \r\n"), std::string::npos) << dxf;
+  EXPECT_NE(dxf.find(" 40\r\n 3 \r\n"), std::string::npos) << dxf;
 }
 
 // A .gre file is an SDR recording: converted with its set-ups, then
