@@ -12,7 +12,7 @@ esac
 
 . tools/ensure-packages.sh
 ensure_packages cmake ninja-build g++ libgtest-dev libcli11-dev qt6-base-dev qt6-l10n-tools qt6-tools-dev xvfb xauth \
-  python3-ezdxf libbenchmark-dev fonts-dejavu-core
+  python3-ezdxf libbenchmark-dev fonts-dejavu-core fonts-noto-mono qt6-svg-dev poppler-utils
 
 export CMAKE_GENERATOR=Ninja
 cmake --preset "$preset"

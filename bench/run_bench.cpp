@@ -11,30 +11,11 @@
 #include "core/lines.h"
 #include "core/numbers.h"
 #include "core/run.h"
+#include "tests/generated_book.h"
 
 namespace {
 
 namespace fs = std::filesystem;
-
-// A field book of `stations` set-ups on a line of control points, each with
-// `points` detail points, a peg and a check record.
-std::string FieldBook(int stations, int points) {
-  std::string book;
-  for (int k = 0; k <= stations; ++k) {
-    book += "TR K" + std::to_string(k) + " " + std::to_string(1000 + 100 * k) + " 5000 10\r\n";
-  }
-  for (int k = 1; k <= stations; ++k) {
-    book += "TR K" + std::to_string(k) + " 1.5\r\nDKD K" + std::to_string(k - 1) + "\r\n";
-    for (int p = 0; p < points; ++p) {
-      const int reading = (p * 7919) % 3600000;
-      book += std::to_string(k) + "-" + std::to_string(p) + " " + std::to_string(reading) + " " +
-              std::to_string(5 + p % 150) + ".125 0893000 1.5 N\r\n";
-    }
-    book += "C" + std::to_string(k) + " 1800000 20 900000 1.5 CP" + std::to_string(k) + "\r\n";
-    book += "T" + std::to_string(k) + " 0 100 900000 1.5 K" + std::to_string(k + 1) + " KT\r\n";
-  }
-  return book;
-}
 
 long PeakRssKiB() {
   rusage usage{};
@@ -50,7 +31,8 @@ void BM_ComputationRun(benchmark::State& state) {
   const fs::path file = folder / "data" / "job.asc";
   {
     kavu::TextOut out(file);
-    out.Write(FieldBook(stations, points));
+    out.Write(kavu::testing::GeneratedFieldBook(stations, points));
+    out.commit();
   }
   kavu::QuietHost host;
   for (auto _ : state) {

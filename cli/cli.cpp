@@ -6,10 +6,12 @@
 #include <CLI/CLI.hpp>
 #include <array>
 #include <charconv>
+#include <cmath>
 #include <cstdint>
 #include <exception>
 #include <optional>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "core/host.h"
@@ -17,6 +19,9 @@
 #include "core/run.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
+#ifdef KAVU_CLI_PICTURES
+#include "cli/pictures.h"
+#endif
 
 namespace kavu {
 
@@ -32,6 +37,10 @@ constexpr std::string_view kFooter =
   --dxf     the drawing exchange file NAME.dxf
   --pegs    the auxiliary-peg file NAME.cp
   --kc      the control-coordinate file NAME.kc
+Pictures (in a build with Qt) go where their option says:
+  --png, --svg  the map of the whole survey (control points, stations,
+            pegs, detail points; points named in NAME.err in red)
+  --pdf     the field sketch on A4 pages (ticks --sketch)
 The error report NAME.err and the station listing NAME.cpv are always written
 and are removed again when the run finds no data error. Instrument files
 (.sdr .gre .obs .set .idx .tcm) are first converted into the field book
@@ -47,7 +56,9 @@ Exit status:
   1   the run completed with data errors (see NAME.err), or a product could
       not be written
   2   the run did not start or stopped early (the message is on stderr)
-  64  bad usage)";
+  64  bad usage
+  130 stopped by Ctrl+C: no product was written, the earlier ones are kept
+      (a second Ctrl+C ends the command at once))";
 
 // The seven header texts: option, meaning, default (the header form's).
 struct HeaderOption {
@@ -70,7 +81,8 @@ constexpr std::array<HeaderOption, 7> kHeaderOptions{{
 // not shown (the command prints the summary itself).
 class BatchHost : public Host {
  public:
-  BatchHost(std::ostream& err, bool errIsTerminal) : err_(err), terminal_(errIsTerminal) {}
+  BatchHost(std::ostream& err, bool errIsTerminal, const std::atomic<bool>* interrupted)
+      : err_(err), terminal_(errIsTerminal), interrupted_(interrupted) {}
 
   MsgAnswer MessageBox(std::string_view text, MsgIcon, MsgButtons buttons) override {
     const bool summary = buttons == MsgButtons::YesNo && text.starts_with(msg::kTotalStations);
@@ -95,6 +107,7 @@ class BatchHost : public Host {
   void SetFileBox(std::string_view) override {}
   void FocusFileBox() override {}
   void SelectKind(int) override {}
+  bool Cancelled() override { return interrupted_ != nullptr && interrupted_->load(); }
 
   void ClearProgress() {
     if (!progressShown_) return;
@@ -113,6 +126,7 @@ class BatchHost : public Host {
 
   std::ostream& err_;
   bool terminal_;
+  const std::atomic<bool>* interrupted_;
   bool progressShown_ = false;
 };
 
@@ -129,6 +143,18 @@ std::optional<std::uint64_t> ParseSeed(std::string_view text) {
   return value;
 }
 
+// A number typed in full: the whole text is a finite decimal number.
+std::optional<double> ParseNumber(std::string_view text) {
+  if (text.starts_with('+')) text.remove_prefix(1);
+  double value = 0;
+  const auto [end, ec] = std::from_chars(text.data(), text.data() + text.size(), value);
+  if (ec != std::errc{} || end != text.data() + text.size() || text.empty() ||
+      !std::isfinite(value)) {
+    return std::nullopt;
+  }
+  return value;
+}
+
 // The command line's settings, before they are turned into window fields.
 struct Settings {
   std::string file;
@@ -139,6 +165,7 @@ struct Settings {
   bool asc = false, txt = false, sketch = false, dxf = false, pegs = false, kc = false;
   bool all = false;
   bool heights = true;
+  std::string png, svg, pdf;
   std::string controlFile;
   std::string seed;
   std::array<std::string, 7> header{};
@@ -152,7 +179,7 @@ int Usage(std::ostream& err, std::string_view what) {
 }  // namespace
 
 int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostream& err,
-           bool errIsTerminal) {
+           bool errIsTerminal, const std::atomic<bool>* interrupted) {
   Settings set;
   for (std::size_t i = 0; i < kHeaderOptions.size(); ++i) {
     set.header[i] = kHeaderOptions[i].fallback;
@@ -178,13 +205,13 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
       ->type_name("auto|0..9");
   app.add_option("--scale", set.scale,
                  "map scale denominator: sets the distance tolerance (default: 1000)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
   app.add_option("--text-height", set.textHeight,
                  "label height in mm in the drawing file (default: 2.0)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
   app.add_option("--height-decimals", set.heightDecimals,
                  "decimals of the heights in the coordinate text file (default: 2)")
-      ->type_name("TEXT");
+      ->type_name("NUMBER");
 
   app.add_flag("--asc", set.asc, "write the regenerated field book and its companion file");
   app.add_flag("--txt", set.txt, "write the coordinate text file");
@@ -193,6 +220,12 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   app.add_flag("--pegs", set.pegs, "write the auxiliary-peg file");
   app.add_flag("--kc", set.kc, "write the control-coordinate file");
   app.add_flag("--all", set.all, "write all six products");
+  app.add_option("--png", set.png, "draw the map of the survey as a PNG picture")
+      ->type_name("FILE");
+  app.add_option("--svg", set.svg, "draw the map of the survey as an SVG picture")
+      ->type_name("FILE");
+  app.add_option("--pdf", set.pdf, "print the field sketch to a PDF file (ticks --sketch)")
+      ->type_name("FILE");
   // Each flag sets the value as it is met, so the last one given wins.
   app.add_flag_callback(
          "--heights", [&set] { set.heights = true; },
@@ -225,12 +258,25 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
 
   const std::optional<int> kind = ParseKind(set.kind);
   if (!kind) return Usage(err, "--kind: expected auto or a number from 0 to 9, got: " + set.kind);
+  const std::optional<double> scale = ParseNumber(set.scale);
+  if (!scale || *scale <= 0)
+    return Usage(err, "--scale: expected a positive number, got: " + set.scale);
+  for (const auto& [option, text] : {std::pair{"--text-height", &set.textHeight},
+                                     std::pair{"--height-decimals", &set.heightDecimals}}) {
+    if (!ParseNumber(*text))
+      return Usage(err, std::string(option) + ": expected a number, got: " + *text);
+  }
   std::optional<std::uint64_t> seed;
   if (!set.seed.empty() || app.count("--seed") > 0) {
     seed = ParseSeed(set.seed);
     if (!seed)
       return Usage(err, "--seed: expected a whole number from 0 to 2^64-1, got: " + set.seed);
   }
+
+  const bool pictures = !set.png.empty() || !set.svg.empty() || !set.pdf.empty();
+#ifndef KAVU_CLI_PICTURES
+  if (pictures) return Usage(err, "--png, --svg and --pdf: this kavu-cli was built without Qt");
+#endif
 
   RunState st;
   st.txtfile = set.file;
@@ -241,7 +287,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   const auto tick = [&](bool wanted) { return wanted || set.all ? 1 : 0; };
   st.fasc = tick(set.asc);
   st.ftd = tick(set.txt);
-  st.fsdo = tick(set.sketch);
+  st.fsdo = tick(set.sketch || !set.pdf.empty());
   st.fdxf = tick(set.dxf);
   st.fcp = tick(set.pegs);
   st.fkc = tick(set.kc);
@@ -253,7 +299,7 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   st.seed = seed;
   for (std::size_t i = 0; i < set.header.size(); ++i) st.nhapsdo[i] = Utf8ToTcvn3(set.header[i]);
 
-  BatchHost host(err, errIsTerminal);
+  BatchHost host(err, errIsTerminal, interrupted);
   RunResult result;
   try {
     result = tinh_Click(st, host);
@@ -263,7 +309,15 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
     return kExitStopped;
   }
   host.ClearProgress();
+  if (result.outcome == RunOutcome::Cancelled) return kExitInterrupted;
   if (result.outcome != RunOutcome::Completed) return kExitStopped;
+#ifdef KAVU_CLI_PICTURES
+  if (pictures) {
+    for (std::string& path : WritePictures(st, {set.png, set.svg, set.pdf})) {
+      result.unwritable.push_back(std::move(path));
+    }
+  }
+#endif
 
   for (const std::string& line : SummaryLines(result)) out << line << '\n';
   for (const std::string& path : result.unwritable) out << msg::kCannotWrite << path << '\n';

@@ -29,6 +29,15 @@ class Host {
     (void)folder;
     (void)pattern;
   }
+  // How far the station loop has read the working copy: done of total lines.
+  virtual void Progress(long long done, long long total) {
+    (void)done;
+    (void)total;
+  }
+  // True once the user asked to stop the run; the loop asks before each
+  // station. The request may come from another thread (a cancel button, an
+  // interrupt), so the answer must be safe to read from the run's thread.
+  virtual bool Cancelled() { return false; }
 };
 
 // A host that answers every question with its default and shows nothing.

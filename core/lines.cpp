@@ -1,8 +1,29 @@
 #include "core/lines.h"
 
+#include <fstream>
 #include <ios>
 #include <iterator>
 #include <system_error>
+
+#ifdef _WIN32
+#ifndef NOMINMAX
+#define NOMINMAX
+#endif
+#ifndef WIN32_LEAN_AND_MEAN
+#define WIN32_LEAN_AND_MEAN
+#endif
+#include <io.h>
+#include <windows.h>
+// windows.h names a drawing call TextOut; ours is the text file.
+#undef TextOut
+#else
+#include <fcntl.h>
+#include <sys/file.h>
+#include <sys/stat.h>
+#include <unistd.h>
+
+#include <cerrno>
+#endif
 
 #include "core/paths.h"
 
@@ -27,9 +48,15 @@ std::vector<std::string> SplitLines(std::string_view content) {
   return lines;
 }
 
-std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
+bool IsDataFile(const std::filesystem::path& path) {
   std::error_code ec;
-  if (std::filesystem::is_directory(path, ec)) return std::nullopt;
+  return std::filesystem::is_regular_file(path, ec);
+}
+
+bool IsDataFile(const std::string& utf8Path) { return IsDataFile(PathFromUtf8(utf8Path)); }
+
+std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
+  if (!IsDataFile(path)) return std::nullopt;
   std::ifstream in(path, std::ios::binary);
   if (!in) return std::nullopt;
   std::string bytes((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
@@ -51,27 +78,80 @@ std::optional<std::vector<std::string>> ReadLines(const std::string& utf8Path) {
   return ReadLines(PathFromUtf8(utf8Path));
 }
 
+namespace {
+
+// The path with its folder resolved (./, .., links of folders) and its last
+// name kept as written.
+std::filesystem::path Resolved(const std::filesystem::path& path) {
+  std::error_code ec;
+  const std::filesystem::path absolute = std::filesystem::absolute(path, ec);
+  const std::filesystem::path folder =
+      std::filesystem::weakly_canonical(absolute.parent_path(), ec);
+  return ec ? absolute.lexically_normal() : folder / absolute.filename();
+}
+
+}  // namespace
+
+bool WouldReplace(const std::filesystem::path& product, const std::filesystem::path& input) {
+  if (Resolved(product) == Resolved(input)) return true;
+  std::error_code ec;
+  if (std::filesystem::is_symlink(std::filesystem::symlink_status(product, ec))) return false;
+  return std::filesystem::equivalent(product, input, ec) && !ec;
+}
+
+bool WouldReplace(const std::string& utf8Product, const std::string& utf8Input) {
+  return WouldReplace(PathFromUtf8(utf8Product), PathFromUtf8(utf8Input));
+}
+
+std::filesystem::path TempPathOf(const std::filesystem::path& path) {
+  std::filesystem::path temp = path;
+  temp += kTempSuffix;
+  return temp;
+}
+
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
 
 TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
 
 bool TextOut::open(const std::string& utf8Path) { return open(PathFromUtf8(utf8Path)); }
 
+TextOut::TextOut(TextOut&& other) noexcept
+    : file_(std::move(other.file_)), path_(std::move(other.path_)), failed_(other.failed_) {}
+
+TextOut& TextOut::operator=(TextOut&& other) noexcept {
+  if (this != &other) {
+    abandon();
+    file_ = std::move(other.file_);
+    path_ = std::move(other.path_);
+    failed_ = other.failed_;
+  }
+  return *this;
+}
+
+TextOut::~TextOut() { abandon(); }
+
 bool TextOut::open(const std::filesystem::path& path) {
-  if (out_.is_open()) close();
+  abandon();
   path_ = path;
-  out_.clear();
-  out_.open(path, std::ios::binary | std::ios::out | std::ios::trunc);
-  failed_ = !out_.is_open();
+  const std::filesystem::path temp = TempPathOf(path);
+  // A temporary file left behind (or a link planted in its place) is
+  // replaced, never written through.
+  std::error_code ec;
+  std::filesystem::remove(temp, ec);
+#ifdef _WIN32
+  file_.reset(_wfopen(temp.c_str(), L"wb"));
+#else
+  file_.reset(std::fopen(temp.c_str(), "wb"));
+#endif
+  failed_ = file_ == nullptr;
   return !failed_;
 }
 
-bool TextOut::ok() const { return out_.is_open() && !failed_; }
+bool TextOut::ok() const { return file_ != nullptr && !failed_; }
 
 void TextOut::Write(std::string_view text) {
-  if (!ok()) return;
-  out_.write(text.data(), static_cast<std::streamsize>(text.size()));
-  if (!out_) failed_ = true;
+  if (!ok() || text.empty()) return;
+  if (std::fwrite(text.data(), 1, text.size(), file_.get()) != text.size()) failed_ = true;
 }
 
 void TextOut::Line(std::string_view text) {
@@ -79,14 +159,109 @@ void TextOut::Line(std::string_view text) {
   Write("\r\n");
 }
 
-bool TextOut::close() {
-  if (out_.is_open()) {
-    out_.flush();
-    if (!out_) failed_ = true;
-    out_.close();
-    if (out_.fail()) failed_ = true;
-  }
-  return !failed_;
+namespace {
+
+// Flushes the file's buffers and the system's to the disk.
+bool FlushToDisk(std::FILE* file) {
+  if (std::fflush(file) != 0) return false;
+#ifdef _WIN32
+  return _commit(_fileno(file)) == 0;
+#else
+  return fsync(fileno(file)) == 0;
+#endif
 }
+
+}  // namespace
+
+bool TextOut::commit() {
+  if (!file_) return !failed_;
+  bool written = !failed_ && FlushToDisk(file_.get());
+  written = std::fclose(file_.release()) == 0 && written;
+  const std::filesystem::path temp = TempPathOf(path_);
+  std::error_code ec;
+  if (written) {
+    // Renaming replaces a link of that name itself, not the file it names.
+    std::filesystem::rename(temp, path_, ec);
+    written = !ec;
+  }
+  if (!written) {
+    failed_ = true;
+    std::filesystem::remove(temp, ec);
+  }
+  return written;
+}
+
+void TextOut::abandon() {
+  if (!file_) return;
+  std::fclose(file_.release());
+  std::error_code ec;
+  std::filesystem::remove(TempPathOf(path_), ec);
+}
+
+#ifdef _WIN32
+
+FileLock::Result FileLock::Acquire(const std::filesystem::path& path) {
+  Release();
+  // The system deletes the lock file when its last handle closes, also when
+  // the process dies.
+  HANDLE handle =
+      CreateFileW(path.c_str(), GENERIC_READ | GENERIC_WRITE,
+                  FILE_SHARE_READ | FILE_SHARE_WRITE | FILE_SHARE_DELETE, nullptr, OPEN_ALWAYS,
+                  FILE_ATTRIBUTE_NORMAL | FILE_FLAG_DELETE_ON_CLOSE, nullptr);
+  if (handle == INVALID_HANDLE_VALUE) {
+    return GetLastError() == ERROR_SHARING_VIOLATION ? Result::Busy : Result::Unavailable;
+  }
+  OVERLAPPED whole{};
+  if (!LockFileEx(handle, LOCKFILE_EXCLUSIVE_LOCK | LOCKFILE_FAIL_IMMEDIATELY, 0, 1, 0, &whole)) {
+    const DWORD error = GetLastError();
+    CloseHandle(handle);
+    return error == ERROR_LOCK_VIOLATION ? Result::Busy : Result::Unavailable;
+  }
+  handle_ = handle;
+  path_ = path;
+  return Result::Taken;
+}
+
+void FileLock::Release() {
+  if (handle_ == nullptr) return;
+  CloseHandle(static_cast<HANDLE>(handle_));
+  handle_ = nullptr;
+}
+
+#else
+
+FileLock::Result FileLock::Acquire(const std::filesystem::path& path) {
+  Release();
+  // A holder removes the lock file when it ends; a lock taken on a file that
+  // was removed meanwhile is taken again on the new one.
+  for (int attempt = 0; attempt < 8; ++attempt) {
+    const int fd = ::open(path.c_str(), O_RDWR | O_CREAT | O_NOFOLLOW | O_CLOEXEC, 0666);
+    if (fd < 0) return Result::Unavailable;
+    if (flock(fd, LOCK_EX | LOCK_NB) != 0) {
+      const int error = errno;
+      ::close(fd);
+      return error == EWOULDBLOCK ? Result::Busy : Result::Unavailable;
+    }
+    struct stat held {};
+    struct stat named {};
+    if (fstat(fd, &held) == 0 && stat(path.c_str(), &named) == 0 && held.st_dev == named.st_dev &&
+        held.st_ino == named.st_ino) {
+      fd_ = fd;
+      path_ = path;
+      return Result::Taken;
+    }
+    ::close(fd);
+  }
+  return Result::Busy;
+}
+
+void FileLock::Release() {
+  if (fd_ < 0) return;
+  ::unlink(path_.c_str());
+  ::close(fd_);
+  fd_ = -1;
+}
+
+#endif
 
 }  // namespace kavu

@@ -4,8 +4,9 @@
 // line after the final line end. Lines are always written with CR LF.
 #pragma once
 
+#include <cstdio>
 #include <filesystem>
-#include <fstream>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
@@ -16,7 +17,13 @@ namespace kavu {
 // Splits a file's bytes into its lines.
 std::vector<std::string> SplitLines(std::string_view content);
 
-// The whole file as bytes, or nothing when it cannot be opened or read.
+// A file that may be read: a regular file, or a link to one. Folders, FIFOs
+// and devices are not (a FIFO would block the run, a device never ends).
+bool IsDataFile(const std::filesystem::path& path);
+bool IsDataFile(const std::string& utf8Path);
+
+// The whole file as bytes, or nothing when it is no data file or cannot be
+// read.
 std::optional<std::string> ReadFileBytes(const std::filesystem::path& path);
 std::optional<std::string> ReadFileBytes(const std::string& utf8Path);
 
@@ -24,26 +31,78 @@ std::optional<std::string> ReadFileBytes(const std::string& utf8Path);
 std::optional<std::vector<std::string>> ReadLines(const std::filesystem::path& path);
 std::optional<std::vector<std::string>> ReadLines(const std::string& utf8Path);
 
-// An output text file; a file that cannot be created swallows its lines and
-// reports !ok(), so the run goes on and names it in the summary.
+// True when writing `product` would replace the file `input` that a run reads:
+// the same path (./ and .. included) or the same file under another name (a
+// hard link, or a symbolic link to it, given as the input). A product that is
+// itself a symbolic link is never the same: writing replaces the link only.
+bool WouldReplace(const std::filesystem::path& product, const std::filesystem::path& input);
+bool WouldReplace(const std::string& utf8Product, const std::string& utf8Input);
+
+// The suffix of the temporary file beside a product while it is written.
+inline constexpr std::string_view kTempSuffix = ".kavu-tmp";
+std::filesystem::path TempPathOf(const std::filesystem::path& path);
+
+// An output text file, written whole or not at all: the lines go to a
+// temporary file beside it (path + ".kavu-tmp"), which commit() flushes to
+// the disk and renames over the file; the previous file stays untouched until
+// then, and for good when the writing fails or the output is abandoned.
+// A file that cannot be created swallows its lines and reports !ok(), so the
+// run goes on and names it in the summary. An output neither committed nor
+// abandoned is abandoned when it is destroyed.
 class TextOut {
  public:
   TextOut() = default;
   explicit TextOut(const std::filesystem::path& path);
   explicit TextOut(const std::string& utf8Path);
+  TextOut(TextOut&& other) noexcept;
+  TextOut& operator=(TextOut&& other) noexcept;
+  ~TextOut();
+
   bool open(const std::filesystem::path& path);
   bool open(const std::string& utf8Path);
-  bool is_open() const { return out_.is_open(); }
+  bool is_open() const { return file_ != nullptr; }
   bool ok() const;
   void Line(std::string_view text);   // text + CR LF
   void Write(std::string_view text);  // text as it stands
-  bool close();                       // false when a write failed
+  // Puts the file in place; false (and the previous file kept) when a write,
+  // the flush to the disk or the rename failed.
+  bool commit();
+  bool close() { return commit(); }
+  // Drops what was written; the previous file stays as it was.
+  void abandon();
   const std::filesystem::path& path() const { return path_; }
 
  private:
-  std::ofstream out_;
+  struct Closer {
+    void operator()(std::FILE* file) const { std::fclose(file); }
+  };
+  std::unique_ptr<std::FILE, Closer> file_;
   std::filesystem::path path_;
   bool failed_ = false;
+};
+
+// An exclusive lock on a file, held by the operating system for this process
+// (released when the process ends, however it ends). The lock file is removed
+// when the lock is released.
+class FileLock {
+ public:
+  enum class Result { Taken, Busy, Unavailable };
+  FileLock() = default;
+  FileLock(const FileLock&) = delete;
+  FileLock& operator=(const FileLock&) = delete;
+  ~FileLock() { Release(); }
+  // Busy when another process holds it; Unavailable when the lock file cannot
+  // be made (a read-only folder).
+  Result Acquire(const std::filesystem::path& path);
+  void Release();
+
+ private:
+  std::filesystem::path path_;
+#ifdef _WIN32
+  void* handle_ = nullptr;
+#else
+  int fd_ = -1;
+#endif
 };
 
 }  // namespace kavu

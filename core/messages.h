@@ -82,4 +82,14 @@ inline constexpr std::string_view kNoDistance = " khong co khoang cach";
 inline constexpr std::string_view kWrongZenith = " nhap sai goc dung";
 inline constexpr std::string_view kNameTooLong = " ten dai qua 12 ky tu";
 
+// Files that the run must not lose.
+inline constexpr std::string_view kProductIsInput = " (trùng File đầu vào)";
+inline constexpr std::string_view kConversionOverInput =
+    "File số liệu chuyển đổi sẽ ghi đè File đầu vào: ";
+inline constexpr std::string_view kBeingComputed = "File đang được tính: ";
+inline constexpr std::string_view kNotDataFile = "Không phải File dữ liệu: ";
+// A run the user stopped, in place of the summary.
+inline constexpr std::string_view kRunCancelled =
+    "Đã dừng tính theo yêu cầu: không ghi File kết quả nào, các File cũ giữ nguyên.";
+
 }  // namespace kavu::msg

@@ -27,15 +27,27 @@ std::string CoordinateTextLine(const RunState& st, int k, int decimals) {
          NumberWidth(p[2], 10) + " " + height + " " + p[4] + " " + p[5];
 }
 
+bool ProductOverInput(RunState& st, const std::string& path) {
+  for (const std::string& input : st.inputs) {
+    if (WouldReplace(path, input)) {
+      st.unwritable.push_back(path + std::string(msg::kProductIsInput));
+      return true;
+    }
+  }
+  return false;
+}
+
 namespace {
 
-// Writes one product; a product that cannot be written is named for the
-// summary and the run goes on with the next.
+// Writes one product whole or not at all; a product that cannot be written, or
+// would replace a file the run reads, is named for the summary and the run
+// goes on with the next.
 template <typename Body>
 void WriteProduct(RunState& st, const std::string& path, Body body) {
+  if (ProductOverInput(st, path)) return;
   TextOut out(path);
   body(out);
-  if (!out.close()) st.unwritable.push_back(path);
+  if (!out.commit()) st.unwritable.push_back(path);
 }
 
 int HeightDecimals(const std::string& text) {

@@ -1,5 +1,6 @@
 #include "core/run.h"
 
+#include <algorithm>
 #include <ctime>
 #include <filesystem>
 #include <string>
@@ -48,6 +49,8 @@ class WorkingCopy {
  public:
   explicit WorkingCopy(RunState& st) : st_(st) {}
   bool AtEnd() const { return next_ >= st_.tamsl.size(); }
+  long long LinesRead() const { return static_cast<long long>(next_); }
+  long long Lines() const { return static_cast<long long>(st_.tamsl.size()); }
   void ReadLine() {
     st_.dong = AtEnd() ? std::string() : st_.tamsl[next_++];
     st_.MangTruong = SplitFields(st_.dong);
@@ -224,12 +227,35 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   }
 }
 
-void CloseKeptFile(RunState& st, TextOut& file) {
-  if (file.is_open() && !file.close()) st.unwritable.push_back(Utf8FromPath(file.path()));
+void CommitKeptFile(RunState& st, TextOut& file) {
+  if (file.is_open() && !file.commit()) st.unwritable.push_back(Utf8FromPath(file.path()));
 }
 
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
+  if (ProductOverInput(st, path)) return;
   if (!file.open(path)) st.unwritable.push_back(path);
+}
+
+// A run that stops early leaves every product as it was.
+void AbandonKeptFiles(RunState& st) {
+  for (TextOut* file : {&st.errFile, &st.cpvFile, &st.sdoFile, &st.cpFile}) file->abandon();
+}
+
+// Removes a file the run wrote earlier, never one it reads.
+void RemoveProduct(const RunState& st, const std::string& path) {
+  for (const std::string& input : st.inputs) {
+    if (WouldReplace(path, input)) return;
+  }
+  std::error_code ignored;
+  std::filesystem::remove(PathFromUtf8(path), ignored);
+}
+
+// A station record that the station loop can reach: on any line but the last.
+bool HasStationRecord(const std::vector<std::string>& tamsl) {
+  if (tamsl.size() < 2) return false;
+  return std::any_of(tamsl.begin(), tamsl.end() - 1, [](const std::string& line) {
+    return line.starts_with("TR") && line.find(' ') != std::string::npos;
+  });
 }
 
 RunResult Finish(RunState& st, RunOutcome outcome) {
@@ -257,9 +283,16 @@ RunResult tinh_Click(RunState& st, Host& host) {
   st.rng = st.seed ? SplitMix64(*st.seed) : SplitMix64::FromClock();
   const std::string startTime = TimeOfDay();
 
-  const auto fieldBook = CheckAndConvert(st, host);
+  FileLock jobLock;
+  const auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
 
+  st.Tyle = st.TyleTXT;
+  st.Htext = st.Htxt;
+  st.dscdh = DistanceTolerance(Val(st.Tyle));
+
+  // Every product goes to a temporary file and replaces the earlier one only
+  // when the run has come to its end, after all that it reads was read.
   if (Ticked(st.fcp)) OpenKeptFile(st, st.cpFile, st.daufile + ".cp");
   if (Ticked(st.fsdo)) OpenKeptFile(st, st.sdoFile, st.daufile + ".sdo");
   OpenKeptFile(st, st.errFile, st.daufile + ".err");
@@ -267,37 +300,27 @@ RunResult tinh_Click(RunState& st, Host& host) {
   for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
-
-  st.Tyle = st.TyleTXT;
-  st.Htext = st.Htxt;
-  st.dscdh = DistanceTolerance(Val(st.Tyle));
-
-  auto closeAll = [&] {
-    CloseKeptFile(st, st.cpvFile);
-    CloseKeptFile(st, st.errFile);
-  };
   if (!DocFileKhongChe(st, host, *fieldBook)) {
-    closeAll();
-    CloseKeptFile(st, st.cpFile);
-    CloseKeptFile(st, st.sdoFile);
+    AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
   st.ChuoiKC.clear();
-  if (st.tamsl.empty()) {
+  // The working copy holds no station record the loop could reach (control
+  // records only, one line, one endless line).
+  if (!HasStationRecord(st.tamsl)) {
     host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
     st.txtfile.clear();
     host.SetFileBox("");
     host.FocusFileBox();
-    closeAll();
-    CloseKeptFile(st, st.cpFile);
-    CloseKeptFile(st, st.sdoFile);
+    AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
 
   Counters counters;
   WorkingCopy copy(st);
   copy.ReadLine();
-  while (!copy.AtEnd()) {
+  while (!copy.AtEnd() && !host.Cancelled()) {
+    host.Progress(copy.LinesRead(), copy.Lines());
     ReadStationHeader(st, copy);
     if (st.I != 0) {
       ComputeStation(st, host, copy, counters);
@@ -305,18 +328,32 @@ RunResult tinh_Click(RunState& st, Host& host) {
       SkipStation(st, copy);
     }
   }
-
-  closeAll();
-  WriteTextProducts(st);
-  if (Ticked(st.fdxf) && !indxf(st)) st.unwritable.push_back(st.daufile + ".dxf");
-  CloseKeptFile(st, st.cpFile);
-  CloseKeptFile(st, st.sdoFile);
-  if (st.err == 0) {
-    std::error_code ignored;
-    for (const char* extension : {".err", ".cpv", ".bak"}) {
-      std::filesystem::remove(PathFromUtf8(st.daufile + extension), ignored);
-    }
+  // Stopped by the user: as a run that stops early, nothing is written.
+  if (host.Cancelled()) {
+    AbandonKeptFiles(st);
+    host.SetTitle(msg::kProgramTitle);
+    host.MessageBox(msg::kRunCancelled, MsgIcon::Information, MsgButtons::Ok);
+    return Finish(st, RunOutcome::Cancelled);
   }
+
+  // A run without errors leaves no error report and no station listing.
+  if (st.err == 0) {
+    st.errFile.abandon();
+    st.cpvFile.abandon();
+    for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
+  } else {
+    CommitKeptFile(st, st.cpvFile);
+    CommitKeptFile(st, st.errFile);
+  }
+  WriteTextProducts(st);
+  if (Ticked(st.fdxf) && !ProductOverInput(st, st.daufile + ".dxf") && !indxf(st)) {
+    st.unwritable.push_back(st.daufile + ".dxf");
+  }
+  CommitKeptFile(st, st.cpFile);
+  CommitKeptFile(st, st.sdoFile);
+  if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");
+
+  jobLock.Release();
 
   RunResult result = Finish(st, RunOutcome::Completed);
   result.stations = counters.stations;

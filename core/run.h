@@ -14,6 +14,7 @@ enum class RunOutcome {
   NotStarted,    // the chosen file was refused (message box shown)
   StoppedEarly,  // the run ended before the station loop (message box shown)
   Completed,     // the summary was shown
+  Cancelled,     // the user stopped the station loop: nothing written (message box shown)
 };
 
 struct RunResult {

@@ -146,6 +146,9 @@ struct ComputationFields {
 
   // Products that could not be written, named in the summary.
   std::vector<std::string> unwritable;
+  // The files the run reads (chosen file, field book, common control file):
+  // no product is written over one of them.
+  std::vector<std::string> inputs;
 };
 
 struct RunState : WindowFields, FileSelection, ComputationFields {

@@ -1,29 +1,14 @@
 // A whole computation run with every product on any field book.
-#include <unistd.h>
-
 #include <cstddef>
 #include <cstdint>
-#include <filesystem>
-#include <string>
+#include <string_view>
 
-#include "core/host.h"
-#include "core/lines.h"
-#include "core/run.h"
+#include "fuzz/run_every_product.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
-  namespace fs = std::filesystem;
-  static const fs::path folder =
-      fs::temp_directory_path() / ("kavu_fuzz_" + std::to_string(getpid())) / "data";
-  fs::create_directories(folder);
-  {
-    kavu::TextOut out(folder / "job.asc");
-    out.Write(std::string(reinterpret_cast<const char*>(data), size));
-  }
-  kavu::RunState st;
-  st.txtfile = (folder / "job.asc").string();
-  st.seed = 1;
-  st.fasc = st.ftd = st.fkc = st.fcp = st.fsdo = st.fdxf = 1;
-  kavu::QuietHost host;
-  (void)kavu::tinh_Click(st, host);
+  static const auto folder = kavu::fuzzing::Folder("kavu_fuzz");
+  kavu::fuzzing::WriteFile(folder / "job.asc",
+                           std::string_view(reinterpret_cast<const char*>(data), size));
+  kavu::fuzzing::RunEveryProduct(folder / "job.asc");
   return 0;
 }

@@ -54,6 +54,37 @@ std::string NotFoundMessage(const std::string& path) {
   return std::string(msg::kFileNotFound) + path + "\r" + std::string(msg::kEnterNewFile);
 }
 
+// A file to read: it must exist and be a data file (a FIFO would block the
+// run, a device never ends). Refused otherwise, with txtfile emptied.
+bool ReadableFile(RunState& st, Host& host, const std::string& path) {
+  std::error_code ec;
+  if (!fs::exists(PathFromUtf8(path), ec)) {
+    RefuseFile(st, host, NotFoundMessage(path));
+    return false;
+  }
+  if (!IsDataFile(path)) {
+    RefuseFile(st, host, std::string(msg::kNotDataFile) + path);
+    return false;
+  }
+  return true;
+}
+
+// The temporary files that a killed run of this job left beside its products.
+void RemoveLeftovers(const RunState& st) {
+  std::vector<std::string> products{st.filesl1};
+  for (const char* extension :
+       {".asc", ".err", ".cpv", ".sdo", ".cp", ".kc", ".td1", ".txt", ".dxf"}) {
+    products.push_back(st.daufile + extension);
+  }
+  for (const std::string& product : products) {
+    const std::string temp = product + std::string(kTempSuffix);
+    bool read = false;
+    for (const std::string& input : st.inputs) read = read || WouldReplace(temp, input);
+    std::error_code ec;
+    if (!read) fs::remove(PathFromUtf8(temp), ec);
+  }
+}
+
 using Converter = Conversion (*)(std::string_view content, int kind);
 
 // The converter of a kind; none for the kinds whose field book must exist.
@@ -117,18 +148,15 @@ void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   sel.filesl1 = sel.tentmbd + name.substr(0, firstDot) + ".asc";
 }
 
-std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host) {
+std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host,
+                                                        FileLock* jobLock) {
   // The chosen file.
   if (st.txtfile.empty()) {
     st.filesl.clear();
     RefuseFile(st, host, msg::kNoFileChosen);
     return std::nullopt;
   }
-  std::error_code ec;
-  if (!fs::is_regular_file(PathFromUtf8(st.txtfile), ec)) {
-    RefuseFile(st, host, NotFoundMessage(st.txtfile));
-    return std::nullopt;
-  }
+  if (!ReadableFile(st, host, st.txtfile)) return std::nullopt;
   DeriveFileSelection(st, st.txtfile);
   const int kind = st.kindOverride >= 0 && st.kindOverride <= 9
                        ? st.kindOverride
@@ -141,6 +169,7 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
       st.nhap[i] = FixedWidth(st.nhapsdo[i], kHeaderWidths[i]);
     }
   }
+  std::error_code ec;
   if (fs::file_size(PathFromUtf8(st.filesl), ec) == 0 && !ec) {
     RefuseFile(st, host,
                std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
@@ -148,10 +177,42 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
   }
 
   // The field book to compute: the chosen file itself, a converted one, or
-  // the one of the same base name for kinds without a converter.
-  std::optional<std::string> content;
+  // the one of the same base name for kinds without a converter. A converted
+  // one never replaces a file that the run reads.
   const std::string fieldBook = kind == 0 ? st.filesl : st.daufile + ".asc";
-  if (const Converter convert = ConverterOf(kind)) {
+  const Converter convert = ConverterOf(kind);
+  st.inputs = {st.filesl};
+  if (Ticked(st.ckKC) && !Trim(st.txtFKC).empty()) st.inputs.push_back(Trim(st.txtFKC));
+  if (convert) {
+    for (const std::string& input : st.inputs) {
+      if (WouldReplace(fieldBook, input)) {
+        host.MessageBox(std::string(msg::kConversionOverInput) + fieldBook, MsgIcon::Critical,
+                        MsgButtons::Ok);
+        return std::nullopt;
+      }
+    }
+  } else if (fieldBook != st.filesl) {
+    if (!ReadableFile(st, host, fieldBook)) return std::nullopt;
+    st.inputs.push_back(fieldBook);
+  }
+
+  // One run of a job at a time; what a killed run left is removed.
+  if (jobLock != nullptr) {
+    switch (jobLock->Acquire(PathFromUtf8(st.daufile + ".lock"))) {
+      case FileLock::Result::Busy:
+        host.MessageBox(std::string(msg::kBeingComputed) + st.filesl, MsgIcon::Critical,
+                        MsgButtons::Ok);
+        return std::nullopt;
+      case FileLock::Result::Taken:
+        RemoveLeftovers(st);
+        break;
+      case FileLock::Result::Unavailable:  // a read-only folder: no lock, nothing to remove
+        break;
+    }
+  }
+
+  std::optional<std::string> content;
+  if (convert) {
     const auto raw = ReadFileBytes(st.filesl);
     if (!raw) {
       host.MessageBox(std::string(msg::kCannotOpen) + st.filesl, MsgIcon::Critical, MsgButtons::Ok);
@@ -162,12 +223,8 @@ std::optional<std::vector<std::string>> CheckAndConvert(RunState& st, Host& host
     st.conversionReport = std::move(conversion.report);
     TextOut out(fieldBook);
     out.Write(*content);
-    if (!out.close()) st.unwritable.push_back(fieldBook);
+    if (!out.commit()) st.unwritable.push_back(fieldBook);
   } else {
-    if (!fs::is_regular_file(PathFromUtf8(fieldBook), ec)) {
-      RefuseFile(st, host, NotFoundMessage(fieldBook));
-      return std::nullopt;
-    }
     content = ReadFileBytes(fieldBook);
   }
   if (!content) {

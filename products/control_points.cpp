@@ -1,6 +1,10 @@
 #include "products/control_points.h"
 
+#include <filesystem>
+#include <system_error>
+
 #include "core/messages.h"
+#include "core/paths.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
@@ -40,6 +44,12 @@ bool DocFileKhongChe(RunState& st, Host& host, const std::vector<std::string>& f
     const std::string path = Trim(st.txtFKC);
     if (path.empty()) {
       host.MessageBox(msg::kNoControlFile, MsgIcon::None, MsgButtons::Ok);
+      return false;
+    }
+    // Only a data file is read: a FIFO would block the run, a device never ends.
+    std::error_code ec;
+    if (std::filesystem::exists(PathFromUtf8(path), ec) && !IsDataFile(path)) {
+      host.MessageBox(std::string(msg::kNotDataFile) + path, MsgIcon::Critical, MsgButtons::Ok);
       return false;
     }
     const auto lines = ReadLines(path);

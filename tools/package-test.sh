@@ -7,7 +7,7 @@ set -euo pipefail
 cd "$(dirname "$0")/.."
 
 . tools/ensure-packages.sh
-ensure_packages cmake ninja-build g++ libcli11-dev qt6-base-dev dpkg-dev file \
+ensure_packages cmake ninja-build g++ libcli11-dev qt6-base-dev qt6-svg-dev dpkg-dev file \
   desktop-file-utils appstream shared-mime-info libglib2.0-bin
 
 export CMAKE_GENERATOR=Ninja
@@ -25,7 +25,7 @@ fail() {
 
 dpkg-deb -f "$deb" Package Version Maintainer Depends Description
 depends=$(dpkg-deb -f "$deb" Depends)
-for needed in libqt6widgets6 libstdc++6 qt6-qpa-plugins; do
+for needed in libqt6widgets6 libqt6svg6 libstdc++6 qt6-qpa-plugins; do
   [[ $depends == *"$needed"* ]] || fail "Depends lacks $needed: $depends"
 done
 [[ $(dpkg-deb -f "$deb" Maintainer) == *"@example.org>" ]] || fail "Maintainer field"

@@ -17,19 +17,24 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QMimeData>
+#include <QProgressBar>
 #include <QPushButton>
 #include <QTextBrowser>
 #include <QToolButton>
 #include <QUrl>
 #include <QVBoxLayout>
+#include <utility>
 
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "import/dispatch.h"
 #include "ui/editor.h"
 #include "ui/lists.h"
+#include "ui/map_window.h"
 #include "ui/nhapsdo.h"
+#include "ui/runthread.h"
 #include "ui/settings.h"
+#include "ui/survey_of.h"
 #include "ui/texts.h"
 #include "ui/timthay.h"
 
@@ -91,6 +96,8 @@ std::string Std(const QString& text) { return text.toStdString(); }
 // The recent files: a key of their own, the paths one a line.
 constexpr const char* kRecentKey = "KAVU_Recent";
 constexpr qsizetype kRecentCount = 8;
+// Whether the map opens by itself after a run: "1" or "0".
+constexpr const char* kOpenMapKey = "KAVU_OpenMap";
 
 #ifdef _WIN32
 constexpr const char* kDefaultFolder = "c:\\";
@@ -131,9 +138,44 @@ MainWindow::MainWindow(QWidget* parent) : Window(parent), ask_(this) {
   }
   lsttm_->setPath(QDir::currentPath());
   Form_Load();
+  ckBando_->setChecked(SettingsStore().read(kOpenMapKey, QStringLiteral("0")) ==
+                       QLatin1String("1"));
 }
 
 MainWindow::~MainWindow() { delete nhapsdo_.data(); }
+
+void MainWindow::buildMapControls(QBoxLayout* buttons) {
+  bando_ = MakeButton(this, "bando", Q(kMapButton));
+  bando_->setEnabled(false);  // until a run has completed
+  ckBando_ = MakeBox(this, "ckBando", kOpenMapAfterRun);
+  const int compute = buttons->indexOf(findChild<QPushButton*>(QStringLiteral("tinh")));
+  buttons->insertWidget(compute + 1, bando_);
+  buttons->insertWidget(buttons->count() - 1, ckBando_);
+  connect(bando_, &QPushButton::clicked, this, &MainWindow::bando_Click);
+}
+
+MapWindow& MainWindow::mapWindow() {
+  if (!map_) map_ = std::make_unique<MapWindow>();
+  return *map_;
+}
+
+void MainWindow::afterRun() {
+  if (ending_ || lastRun_.outcome != RunOutcome::Completed) return;
+  mapStale_ = true;
+  bando_->setEnabled(true);
+  if (ckBando_->isChecked() || (map_ && map_->isVisible())) bando_Click();
+}
+
+void MainWindow::bando_Click() {
+  if (!bando_->isEnabled()) return;
+  MapWindow& map = mapWindow();
+  if (mapStale_) {
+    map.setSurvey(SurveyOf(st_), st_.filesl, Ticked(st_.fsdo) ? st_.daufile + ".sdo" : "");
+    mapStale_ = false;
+  }
+  map.show();
+  map.raise();
+}
 
 void MainWindow::buildControls() {
   auto* lbtieude = MakeLabel(this, "lbtieude", kTitleLabel);
@@ -253,9 +295,11 @@ void MainWindow::buildControls() {
   buttons->addStretch();
   for (QPushButton* button : {tinh, suasolieu, trogiup, thoat}) buttons->addWidget(button);
   buttons->addStretch();
+  buildMapControls(buttons);
   grid->addLayout(buttons, 4, 0, 1, 3);
   grid->setColumnStretch(0, 1);
   grid->setColumnStretch(1, 1);
+  buildRunControls();
   resize(760, 520);
 
   connect(cbkieu_, &QComboBox::activated, this, &MainWindow::cbkieu_Click);
@@ -368,7 +412,8 @@ void MainWindow::lsttm_Change(const QString& path) {
 }
 
 void MainWindow::lstfile_Click(QListWidgetItem* item) {
-  if (item == nullptr) return;
+  // The run's file stays chosen until its end, whatever the list shows.
+  if (item == nullptr || running_) return;
   const QString path = QDir::toNativeSeparators(QDir(lstfile_->path()).filePath(item->text()));
   DeriveFileSelection(st_, Std(path));
   txtfile_->setText(Q(st_.filesl));
@@ -377,7 +422,7 @@ void MainWindow::lstfile_Click(QListWidgetItem* item) {
 
 bool MainWindow::chooseFile(const QString& path) {
   const QFileInfo info(path);
-  if (!info.isFile()) return false;
+  if (!info.isFile() || running_) return false;
   const int kind = KindOfExtension(Std(info.suffix().toUpper()));
   if (!QDir::match(lstfile_->pattern(), info.fileName())) setKind(kind);
   if (lsttm_->setPath(info.absolutePath())) {
@@ -417,6 +462,7 @@ void MainWindow::takeTypedFile() {
 }
 
 void MainWindow::dragEnterEvent(QDragEnterEvent* event) {
+  if (running_) return;
   for (const QUrl& url : event->mimeData()->urls()) {
     if (url.isLocalFile() && QFileInfo(url.toLocalFile()).isFile()) {
       event->acceptProposedAction();
@@ -465,18 +511,15 @@ void MainWindow::collectWindowFields() {
 void MainWindow::tinh_Click() {
   if (running_ || ending_) return;
   takeTypedFile();
-  running_ = true;
   collectWindowFields();
-  QApplication::setOverrideCursor(Qt::WaitCursor);
-  lastRun_ = kavu::tinh_Click(st_, *this);
-  QApplication::restoreOverrideCursor();
-  running_ = false;
+  lastRun_ = computeOffThread();
   if (lastRun_.outcome == RunOutcome::Completed && lastRun_.answer == MsgAnswer::No) {
     // No to "continue?" ends the program; the session's choices are kept.
     if (!editsSettled()) return;
     writeSettingsOnce();
     endProgram();
   }
+  afterRun();
 }
 
 Nhapsdo& MainWindow::headerForm() {
@@ -538,6 +581,7 @@ void MainWindow::trogiup_Click() {
 }
 
 void MainWindow::thoat_Click() {
+  if (running_) return;
   Beep();
   tbao_ = ask_(Q(kExitQuestion), MsgIcon::Question, MsgButtons::YesNo);
   if (tbao_ != MsgAnswer::Yes || !editsSettled()) return;
@@ -550,6 +594,8 @@ void MainWindow::writeSettingsOnce() {
   settingsWritten_ = true;
   GhiCaiDat();
   SettingsStore().write(kRecentKey, recent_.join(QLatin1Char('\n')));
+  SettingsStore().write(kOpenMapKey,
+                        ckBando_->isChecked() ? QStringLiteral("1") : QStringLiteral("0"));
 }
 
 bool MainWindow::editsSettled() { return suasl_->maySave() && xem_->maySave(); }
@@ -560,9 +606,9 @@ void MainWindow::endProgram() {
   // The other windows close with their own closing steps (the header form
   // keeps its texts).
   if (!nhapsdo_.isNull()) nhapsdo_->close();
-  for (QWidget* window :
-       {static_cast<QWidget*>(timthay_.get()), static_cast<QWidget*>(xem_.get()),
-        static_cast<QWidget*>(suasl_.get()), static_cast<QWidget*>(help_.get())}) {
+  for (QWidget* window : {static_cast<QWidget*>(timthay_.get()), static_cast<QWidget*>(xem_.get()),
+                          static_cast<QWidget*>(suasl_.get()), static_cast<QWidget*>(help_.get()),
+                          static_cast<QWidget*>(map_.get())}) {
     if (window != nullptr) window->close();
   }
   close();
@@ -589,17 +635,20 @@ MsgAnswer MainWindow::MessageBox(std::string_view text, MsgIcon icon, MsgButtons
   return tbao_;
 }
 
-void MainWindow::SetTitle(std::string_view title) {
-  setWindowTitle(Q(title));
-  // Let the title show during the run; the user's input waits for its end.
-  QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
-}
+void MainWindow::SetTitle(std::string_view title) { setWindowTitle(Q(title)); }
 
 void MainWindow::Beep() { QApplication::beep(); }
 
 void MainWindow::SetFileBox(std::string_view text) { txtfile_->setText(Q(text)); }
 
-void MainWindow::FocusFileBox() { txtfile_->setFocus(); }
+void MainWindow::FocusFileBox() {
+  // The box is locked while the run works: it takes the focus at the end.
+  if (running_) {
+    focusFileBoxAfterRun_ = true;
+    return;
+  }
+  txtfile_->setFocus();
+}
 
 void MainWindow::SelectKind(int index) { setKind(index); }
 
@@ -618,6 +667,73 @@ void MainWindow::ShowFolder(std::string_view folder, std::string_view pattern) {
   lsttm_->setPath(clean);
   lstfile_->setPattern(Q(pattern));  // lists the new products too
   txttm_->setText(ShortFolderText(lsttm_->path()));
+}
+
+void MainWindow::buildRunControls() {
+  runner_ = new RunThread(*this, this);
+  tiendo_ = new QProgressBar(this);
+  tiendo_->setObjectName(QStringLiteral("tiendo"));
+  dung_ = MakeButton(this, "dung", Q(kStopRun));
+  auto* row = new QHBoxLayout;
+  row->addWidget(tiendo_, 1);
+  row->addWidget(dung_);
+  auto* grid = static_cast<QGridLayout*>(layout());
+  grid->addLayout(row, grid->rowCount(), 0, 1, grid->columnCount());
+  tiendo_->hide();
+  dung_->hide();
+  connect(dung_, &QPushButton::clicked, this, &MainWindow::dung_Click);
+  connect(runner_, &RunThread::progressed, tiendo_, [this](long long done, long long total) {
+    // The bar counts in thousandths: a working copy may exceed its int range.
+    tiendo_->setRange(0, 1000);
+    tiendo_->setValue(total > 0 ? static_cast<int>(done * 1000 / total) : 0);
+  });
+}
+
+RunResult MainWindow::computeOffThread() {
+  running_ = true;
+  const QPointer<QWidget> focused = focusWidget();
+  // Only the stop button takes input (Esc presses it); the choices the run
+  // has read stay as they are until its end.
+  std::vector<QPointer<QWidget>> locked;
+  for (QWidget* control : findChildren<QWidget*>(Qt::FindDirectChildrenOnly)) {
+    if (control == dung_ || control == tiendo_ || qobject_cast<QLabel*>(control) != nullptr ||
+        !control->isEnabled()) {
+      continue;
+    }
+    control->setEnabled(false);
+    locked.emplace_back(control);
+  }
+  auto* thoat = findChild<QPushButton*>(QStringLiteral("thoat"));
+  setCancelButton(dung_);
+  tiendo_->setRange(0, 0);  // busy until the station loop reports
+  tiendo_->show();
+  dung_->setEnabled(true);
+  dung_->show();
+  dung_->setFocus();
+  QApplication::setOverrideCursor(Qt::BusyCursor);
+
+  RunResult result = runner_->run(st_);
+
+  QApplication::restoreOverrideCursor();
+  tiendo_->hide();
+  dung_->hide();
+  setCancelButton(thoat);
+  for (const QPointer<QWidget>& control : locked) {
+    if (control) control->setEnabled(true);
+  }
+  running_ = false;
+  if (std::exchange(focusFileBoxAfterRun_, false)) {
+    FocusFileBox();
+  } else if (focused) {
+    focused->setFocus();
+  }
+  return result;
+}
+
+void MainWindow::dung_Click() {
+  if (!running_) return;
+  runner_->cancel();
+  dung_->setEnabled(false);  // once is enough
 }
 
 }  // namespace kavu::ui

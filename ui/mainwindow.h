@@ -14,12 +14,14 @@
 #include "ui/ask.h"
 #include "ui/dialog.h"
 
+class QBoxLayout;
 class QCheckBox;
 class QComboBox;
 class QLabel;
 class QLineEdit;
 class QListWidgetItem;
 class QMenu;
+class QProgressBar;
 class QPushButton;
 
 namespace kavu::ui {
@@ -27,7 +29,9 @@ namespace kavu::ui {
 class DriveList;
 class FileList;
 class FolderList;
+class MapWindow;
 class Nhapsdo;
+class RunThread;
 class Suasl;
 class Timthay;
 class Xem;
@@ -56,6 +60,7 @@ class MainWindow : public Window, public Host {
   MsgAnswer tbao() const { return tbao_; }
   const RunResult& lastRun() const { return lastRun_; }
   bool ending() const { return ending_; }
+  bool running() const { return running_; }
 
   Suasl& editor() { return *suasl_; }
   Xem& viewer() { return *xem_; }
@@ -85,6 +90,11 @@ class MainWindow : public Window, public Host {
   void suasolieu_Click();
   void trogiup_Click();
   void thoat_Click();
+  // The stop button beside the progress of a run.
+  void dung_Click();
+  // Shows the last completed run on the map.
+  void bando_Click();
+  MapWindow& mapWindow();
 
   // Host: what the computation run asks of the window.
   MsgAnswer MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) override;
@@ -115,6 +125,14 @@ class MainWindow : public Window, public Host {
   void takeTypedFile();
   void remember(const QString& path);
   void fillRecentMenu();
+  // The progress bar and the stop button of a run, hidden between runs.
+  void buildRunControls();
+  // The run of st_ on a thread of its own; the window keeps drawing and only
+  // the stop button takes input until the run has ended.
+  RunResult computeOffThread();
+  // The map button beside the compute button and the "open after a run" box.
+  void buildMapControls(QBoxLayout* buttons);
+  void afterRun();
 
   RunState st_;
   RunResult lastRun_;
@@ -125,6 +143,7 @@ class MainWindow : public Window, public Host {
   bool settingsWritten_ = false;
   bool ending_ = false;
   bool running_ = false;
+  bool focusFileBoxAfterRun_ = false;
   QStringList recent_;
 
   DriveList* lstdia_ = nullptr;
@@ -140,6 +159,9 @@ class MainWindow : public Window, public Host {
   QLineEdit* txtSoleDC_ = nullptr;
   QLineEdit* txtFKC_ = nullptr;
   QMenu* recentMenu_ = nullptr;
+  RunThread* runner_ = nullptr;
+  QProgressBar* tiendo_ = nullptr;
+  QPushButton* dung_ = nullptr;
 
   // The side windows are windows of their own, not tied to this one, so that
   // the user stacks them at will.
@@ -148,6 +170,10 @@ class MainWindow : public Window, public Host {
   std::unique_ptr<Suasl> suasl_;
   std::unique_ptr<Window> help_;
   QPointer<Nhapsdo> nhapsdo_;
+  QPushButton* bando_ = nullptr;
+  QCheckBox* ckBando_ = nullptr;
+  std::unique_ptr<MapWindow> map_;
+  bool mapStale_ = false;  // a run completed since the map was drawn
 };
 
 }  // namespace kavu::ui

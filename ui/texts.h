@@ -61,6 +61,8 @@ inline constexpr std::array<std::string_view, 10> kKinds = {
 inline constexpr std::string_view kFileNotFoundShort = "Không tìm thấy File ";
 inline constexpr std::string_view kDataOfFile = "Số liệu của File: ";
 inline constexpr std::string_view kExitQuestion = "Bạn có muốn thoát khỏi chương trình không ?";
+// Beside the progress of a run: stops it before its next station.
+inline constexpr std::string_view kStopRun = "Dừng tính";
 inline constexpr std::string_view kChooseKcFile = "File KC";
 inline constexpr std::string_view kRecent = "Gần đây";
 

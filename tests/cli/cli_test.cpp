@@ -4,14 +4,11 @@
 #include "cli/cli.h"
 
 #include <gtest/gtest.h>
-#include <sys/wait.h>
 
 #include <charconv>
-#include <cstdlib>
 #include <filesystem>
 #include <map>
 #include <regex>
-#include <sstream>
 #include <string>
 #include <string_view>
 #include <vector>
@@ -20,6 +17,7 @@
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
+#include "tests/cli/cli_support.h"
 #include "tests/support.h"
 
 namespace kavu {
@@ -27,44 +25,12 @@ namespace {
 
 namespace fs = std::filesystem;
 
-struct Outcome {
-  int code = -1;
-  std::string out, err;
-};
-
+using testing::Cli;
+using testing::Exe;
 using testing::FileBytes;
 using testing::FreshFolder;
+using testing::Outcome;
 using testing::WriteBytes;
-
-Outcome Cli(const std::vector<std::string>& args, bool terminal = false) {
-  const std::vector<std::string_view> views(args.begin(), args.end());
-  std::ostringstream out, err;
-  Outcome o;
-  o.code = RunCli(views, out, err, terminal);
-  o.out = out.str();
-  o.err = err.str();
-  return o;
-}
-
-std::string Quote(const std::string& s) {
-  std::string q = "'";
-  for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
-  return q + "'";
-}
-
-// Runs the executable itself, so that main's wiring is covered too.
-Outcome Exe(const std::vector<std::string>& args, const fs::path& dir) {
-  std::string command = Quote(KAVU_CLI_EXE);
-  for (const std::string& a : args) command += " " + Quote(a);
-  command += " <" + Quote("/dev/null") + " >" + Quote((dir / "stdout").string()) + " 2>" +
-             Quote((dir / "stderr").string());
-  const int status = std::system(command.c_str());
-  Outcome o;
-  o.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-  o.out = FileBytes(dir / "stdout");
-  o.err = FileBytes(dir / "stderr");
-  return o;
-}
 
 double Number(std::string_view text) {
   double value = 0;
@@ -116,6 +82,12 @@ TEST(CliUsage, BadCommandLinesExit64WithoutRunning) {
       {"--seed", "-1", book},                    //
       {"--seed", "18446744073709551616", book},  // 2^64 does not fit
       {"--scale", book},                         // option without its value
+      {"--scale", "abc", book},                  // the settings are numbers
+      {"--scale", "0", book},                    // a scale is positive
+      {"--scale", "-500", book},                 //
+      {"--scale", "nan", book},                  //
+      {"--text-height", "2,5", book},            //
+      {"--height-decimals", "", book},           //
   };
   for (const auto& args : bad) {
     const Outcome o = Cli(args);

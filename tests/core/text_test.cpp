@@ -7,6 +7,7 @@
 #include "core/angles.h"
 #include "core/lines.h"
 #include "core/paths.h"
+#include "tests/support.h"
 
 namespace kavu {
 namespace {
@@ -86,13 +87,13 @@ TEST(Lines, EveryLineEndCounts) {
 }
 
 TEST(Lines, TextOutWritesCrLfAndReportsFailure) {
-  const auto dir = std::filesystem::temp_directory_path() / "kavu_lines_test";
-  std::filesystem::create_directories(dir);
+  const auto dir = testing::FreshFolder();
   {
     TextOut out(dir / "a.txt");
     EXPECT_TRUE(out.ok());
     out.Line("x");
     out.Write("y");
+    EXPECT_FALSE(std::filesystem::exists(dir / "a.txt"));  // not before it is whole
     EXPECT_TRUE(out.close());
   }
   EXPECT_EQ(ReadFileBytes(dir / "a.txt"), std::optional<std::string>("x\r\ny"));
@@ -100,11 +101,19 @@ TEST(Lines, TextOutWritesCrLfAndReportsFailure) {
   EXPECT_FALSE(ReadFileBytes(dir / "missing.txt"));
   EXPECT_FALSE(ReadFileBytes(dir));
 
+  // Abandoned, or dropped unfinished: the earlier file stays, no temporary.
+  for (bool explicitly : {true, false}) {
+    TextOut out(dir / "a.txt");
+    out.Line("half");
+    if (explicitly) out.abandon();
+  }
+  EXPECT_EQ(ReadFileBytes(dir / "a.txt"), std::optional<std::string>("x\r\ny"));
+  EXPECT_FALSE(std::filesystem::exists(TempPathOf(dir / "a.txt")));
+
   TextOut bad(dir / "no" / "such" / "b.txt");
   EXPECT_FALSE(bad.ok());
   bad.Line("swallowed");
   EXPECT_FALSE(bad.close());
-  std::filesystem::remove_all(dir);
 }
 
 // Paths are UTF-8 text: a folder and a file with Vietnamese letters are

@@ -5,6 +5,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDir>
+#include <QDirIterator>
 #include <QLineEdit>
 #include <QMimeData>
 #include <QPushButton>
@@ -12,14 +13,17 @@
 #include <QTextBrowser>
 #include <QtTest>
 #include <functional>
+#include <map>
 
 #include "core/messages.h"
 #include "core/tcvn3.h"
 #include "support.h"
+#include "tests/generated_book.h"
 #include "ui/editor.h"
 #include "ui/lists.h"
 #include "ui/nhapsdo.h"
 #include "ui/openfile.h"
+#include "ui/runthread.h"
 #include "ui/timthay.h"
 
 using namespace kavu;
@@ -49,6 +53,16 @@ class MainWindowTest : public QObject {
   }
 
   static QString Native(const QString& path) { return QDir::toNativeSeparators(path); }
+  // Every file of the folder and below by its path, with its bytes.
+  static std::map<QString, QByteArray> Files(const QString& folder) {
+    std::map<QString, QByteArray> files;
+    for (QDirIterator it(folder, QDir::Files | QDir::Hidden, QDirIterator::Subdirectories);
+         it.hasNext();) {
+      const QString path = it.next();
+      files[path] = ReadAll(path);
+    }
+    return files;
+  }
   static QString Sep() { return QString(QDir::separator()); }
 
  private slots:
@@ -251,6 +265,51 @@ class MainWindowTest : public QObject {
     QVERIFY(!desk.ended);
     QVERIFY(w.isVisible());
     QVERIFY(!IsStored("KAVU_Ftd"));
+  }
+
+  void aRunIsStoppedAndWritesNothing() {
+    Desk desk;
+    MainWindow& w = desk.w;
+    w.show();
+    QVERIFY(ShowExample(desk));
+    for (const char* product : {"fdxf", "fsdo"}) Child<QCheckBox>(w, product)->click();
+    QVERIFY(ClickFile(w, QStringLiteral("job1.asc")));
+    Child<QPushButton>(w, "tinh")->click();
+    QCOMPARE(desk.person.asked.size(), 1u);  // the summary of the earlier run
+    // The same job grown large, so that the run is in its station loop when
+    // the stop button is pressed.
+    desk.write("job1.asc", QByteArray::fromStdString(testing::GeneratedFieldBook(400, 100)));
+    const auto before = Files(desk.work.path());
+
+    // The first progress of the loop waits for this to be handled on the
+    // window's thread: the window takes input while the run works.
+    auto* stop = Child<QPushButton>(w, "dung");
+    bool pressed = false;
+    connect(
+        w.findChild<RunThread*>(), &RunThread::progressed, &w,
+        [&] {
+          if (pressed) return;
+          pressed = true;
+          QVERIFY(w.running());
+          QVERIFY(stop->isVisible());
+          QVERIFY(!Child<QPushButton>(w, "tinh")->isEnabled());
+          w.tinh_Click();  // no second run
+          w.close();       // nor closing
+          QTest::mouseClick(stop, Qt::LeftButton);
+        },
+        Qt::BlockingQueuedConnection);
+    Child<QPushButton>(w, "tinh")->click();
+
+    QVERIFY(pressed);
+    QCOMPARE(w.lastRun().outcome, RunOutcome::Cancelled);
+    QCOMPARE(desk.person.asked.size(), 2u);  // the message, in place of the summary
+    QCOMPARE(desk.person.asked[1].text, Q(msg::kRunCancelled));
+    QCOMPARE(desk.person.asked[1].buttons, MsgButtons::Ok);
+    QCOMPARE(Files(desk.work.path()), before);  // nothing written, no temporary file
+    QCOMPARE(w.windowTitle(), Q(msg::kProgramTitle));
+    QVERIFY(w.isVisible() && !desk.ended);
+    QVERIFY(!stop->isVisible());
+    QVERIFY(Child<QPushButton>(w, "tinh")->isEnabled());
   }
 
   void theFieldSketchTakesTheStoredHeaderTexts() {

@@ -1,0 +1,56 @@
+// Running the batch command in the tests: in process, or as the executable
+// itself (so that main's wiring and the process's limits count too).
+#pragma once
+
+#include <sys/wait.h>
+
+#include <cstdlib>
+#include <filesystem>
+#include <sstream>
+#include <string>
+#include <string_view>
+#include <vector>
+
+#include "cli/cli.h"
+#include "tests/support.h"
+
+namespace kavu::testing {
+
+struct Outcome {
+  int code = -1;
+  std::string out, err;
+};
+
+inline Outcome Cli(const std::vector<std::string>& args, bool terminal = false) {
+  const std::vector<std::string_view> views(args.begin(), args.end());
+  std::ostringstream out, err;
+  Outcome o;
+  o.code = RunCli(views, out, err, terminal);
+  o.out = out.str();
+  o.err = err.str();
+  return o;
+}
+
+inline std::string Quote(const std::string& s) {
+  std::string q = "'";
+  for (char c : s) q += c == '\'' ? std::string("'\\''") : std::string(1, c);
+  return q + "'";
+}
+
+// The executable with its output kept in dir; `shell` runs first in the same
+// shell (limits for the process, say).
+inline Outcome Exe(const std::vector<std::string>& args, const std::filesystem::path& dir,
+                   const std::string& shell = "") {
+  std::string command = shell + "exec " + Quote(KAVU_CLI_EXE);
+  for (const std::string& a : args) command += " " + Quote(a);
+  command += " <" + Quote("/dev/null") + " >" + Quote((dir / "stdout").string()) + " 2>" +
+             Quote((dir / "stderr").string());
+  const int status = std::system(command.c_str());
+  Outcome o;
+  o.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+  o.out = FileBytes(dir / "stdout");
+  o.err = FileBytes(dir / "stderr");
+  return o;
+}
+
+}  // namespace kavu::testing

@@ -1,0 +1,296 @@
+// The map of a run: one item per point at its place, doubtful points in red
+// on the screen and in the pictures, a click showing the error lines and the
+// record; the exports read back; the field sketch on pages and in a PDF.
+#include <QCheckBox>
+#include <QFontInfo>
+#include <QImage>
+#include <QPainter>
+#include <QProcess>
+#include <QPushButton>
+#include <QRawFont>
+#include <QStandardPaths>
+#include <QSvgRenderer>
+#include <QtTest>
+
+#include "core/tcvn3.h"
+#include "support.h"
+#include "ui/map_window.h"
+#include "ui/sketch_pdf.h"
+
+using namespace kavu;
+using namespace kavu::ui;
+using namespace kavu::ui::test;
+
+namespace {
+
+// A station on A oriented to B and checked on C, a peg and three detail
+// points; the report names the detail point 2 and the peg.
+Survey HandMade() {
+  Survey s;
+  s.control = {{"A", 1000, 2000, {}}, {"B", 1100, 2000, {}}, {"C", 1000, 2100, {}}};
+  StationResult st{s.control[0], s.control[1], 0, 100, s.control[2], {}, 2};
+  s.stations = {st};
+  s.points = {{"1", 1010, 2010, {}, "10", "", PointKind::Detail, 0, 4},
+              {"2", 1020, 1990, {}, "", "", PointKind::Detail, 0, 5},
+              {"CP" + Utf8ToTcvn3("đ"), 990, 2030, {}, "", "", PointKind::Peg, 0, 6},
+              {"3", 1040, 2050, {}, "", "", PointKind::Detail, 0, 7}};
+  s.report = {
+      {"Diem 2            nhap sai phan phut", "2", 5},
+      {"Diem CP" + Utf8ToTcvn3("đ") + "          nhap sai phan giay", "CP" + Utf8ToTcvn3("đ"), 6}};
+  return s;
+}
+
+QColor PixelAt(const QImage& image, QPointF at) { return image.pixelColor(at.toPoint()); }
+bool Red(const QColor& c) { return c.red() > 180 && c.green() < 80 && c.blue() < 80; }
+
+}  // namespace
+
+class MapTest : public QObject {
+  Q_OBJECT
+
+  QTemporaryDir store_;
+
+ private slots:
+  void init() { UseScratchSettings(store_); }
+
+  void oneItemPerPointAtItsPlaceWithTheRightHighlight() {
+    const MapModel model = BuildMap(HandMade());
+    struct Expected {
+      MapKind kind;
+      QString name;
+      double x, y;
+      bool red;
+    };
+    const std::vector<Expected> expected = {
+        {MapKind::Control, "A", 1000, 2000, false}, {MapKind::Control, "B", 1100, 2000, false},
+        {MapKind::Control, "C", 1000, 2100, false}, {MapKind::Station, "A", 1000, 2000, false},
+        {MapKind::Detail, "1", 1010, 2010, false},  {MapKind::Detail, "2", 1020, 1990, true},
+        {MapKind::Peg, "CPđ", 990, 2030, true},     {MapKind::Detail, "3", 1040, 2050, false},
+    };
+    QCOMPARE(model.items.size(), expected.size());
+    for (std::size_t i = 0; i < expected.size(); ++i) {
+      const MapItem& item = model.items[i];
+      QCOMPARE(item.kind, expected[i].kind);
+      QCOMPARE(item.name, expected[i].name);
+      QCOMPARE(item.x, expected[i].x);
+      QCOMPARE(item.y, expected[i].y);
+      QCOMPARE(item.flagged, expected[i].red);
+    }
+    QCOMPARE(model.sights.size(), 2u);  // orientation and check sight
+
+    // North up, east right, one scale: B is above A, C right of A, as far.
+    const MapView view = FitView(model, QSize(400, 400));
+    const QPointF a = view.toDevice(1000, 2000), b = view.toDevice(1100, 2000),
+                  c = view.toDevice(1000, 2100);
+    QCOMPARE(b.x(), a.x());
+    QVERIFY(b.y() < a.y());
+    QCOMPARE(c.y(), a.y());
+    QCOMPARE(c.x() - a.x(), a.y() - b.y());
+
+    // The painting: red where the report points, black elsewhere.
+    QImage image(view.size, QImage::Format_RGB32);
+    QPainter painter(&image);
+    PaintMap(painter, model, view);
+    painter.end();
+    QVERIFY(Red(PixelAt(image, view.toDevice(1020, 1990))));
+    const QColor plain = PixelAt(image, view.toDevice(1040, 2050));
+    QVERIFY(plain.lightness() < 60 && !Red(plain));
+  }
+
+  void wheelZoomKeepsThePointUnderTheCursorAndAClickShowsTheRecord() {
+    QTemporaryDir dir;
+    const QString book = dir.filePath(QStringLiteral("job.asc"));
+    WriteAll(book, "TR A 1 2\r\nTR B 3 4\r\nTR A 1.5\r\nDKD B\r\n2 0751234 10 900000 1.5\r\n");
+    MapWindow map;
+    map.setSurvey(HandMade(), book.toStdString(), "");
+    map.resize(640, 560);
+    map.show();
+    QVERIFY(QTest::qWaitForWindowExposed(&map));
+    MapCanvas& canvas = map.canvas();
+
+    const QPointF at = canvas.view().toDevice(1020, 1990);
+    const QPointF ground = canvas.view().toGround(at + QPointF(30, 20));
+    const double scale = canvas.view().scale;
+    QWheelEvent wheel(at + QPointF(30, 20), canvas.mapToGlobal(at + QPointF(30, 20)), {}, {0, 240},
+                      Qt::NoButton, Qt::NoModifier, Qt::NoScrollPhase, false);
+    QCoreApplication::sendEvent(&canvas, &wheel);
+    QVERIFY(canvas.view().scale > scale);
+    const QPointF still = canvas.view().toGround(at + QPointF(30, 20));
+    QVERIFY(std::abs(still.x() - ground.x()) < 1e-6 && std::abs(still.y() - ground.y()) < 1e-6);
+
+    QTest::mouseClick(&canvas, Qt::LeftButton, {}, canvas.view().toDevice(1020, 1990).toPoint());
+    QVERIFY2(map.details().contains(QStringLiteral("nhap sai phan phut")),
+             qPrintable(map.details()));
+    QVERIFY(map.details().contains(QStringLiteral("2 0751234 10 900000 1.5")));
+    QVERIFY(map.details().contains(QStringLiteral("5")));
+
+    // A drag pans the map by as much as the mouse moved.
+    const QPointF before = canvas.view().toDevice(1000, 2000);
+    QTest::mousePress(&canvas, Qt::LeftButton, {}, QPoint(100, 100));
+    QMouseEvent move(QEvent::MouseMove, QPointF(140, 90), canvas.mapToGlobal(QPointF(140, 90)),
+                     Qt::NoButton, Qt::LeftButton, Qt::NoModifier);
+    QCoreApplication::sendEvent(&canvas, &move);
+    QTest::mouseRelease(&canvas, Qt::LeftButton, {}, QPoint(140, 90));
+    const QPointF after = canvas.view().toDevice(1000, 2000);
+    QVERIFY(std::abs(after.x() - before.x() - 40) < 1e-6);
+    QVERIFY(std::abs(after.y() - before.y() + 10) < 1e-6);
+  }
+
+  void exportsReadBack() {
+    QTemporaryDir dir;
+    MapWindow map;
+    map.setSurvey(HandMade(), {}, {});
+    map.resize(500, 400);
+    map.show();
+    QVERIFY(QTest::qWaitForWindowExposed(&map));
+    const QString png = dir.filePath(QStringLiteral("view.png"));
+    const QString whole = dir.filePath(QStringLiteral("whole.png"));
+    const QString svg = dir.filePath(QStringLiteral("whole.svg"));
+    QVERIFY(map.savePicture(png, false));
+    QVERIFY(map.savePicture(whole, true));
+    QVERIFY(map.savePicture(svg, true));
+    QCOMPARE(QImage(png).size(), map.canvas().size());
+    const QImage image(whole);
+    QCOMPARE(image.size(), kWholeSurveySize);
+    const MapView view = FitView(map.canvas().model(), kWholeSurveySize);
+    QVERIFY(Red(PixelAt(image, view.toDevice(1020, 1990))));
+    QSvgRenderer renderer(svg);
+    QVERIFY(renderer.isValid());
+    QCOMPARE(renderer.viewBoxF(), QRectF(QPointF(0, 0), QSizeF(kWholeSurveySize)));
+    QVERIFY(QString::fromUtf8(ReadAll(svg)).contains(QStringLiteral("CPđ")));
+    QVERIFY(!map.savePicture(dir.filePath(QStringLiteral("no/such/folder/x.png")), true));
+  }
+
+  void sketchPagesRepeatTheColumnHeads() {
+    // Two stations; the first has more rows than a page holds.
+    auto section = [](const QString& station, int rows) {
+      QStringList s = {QString(),
+                       QStringLiteral("Lược đồ số:01    SO DO CHI TIET"),
+                       QString(),
+                       QStringLiteral("Điểm trạm đo: ") + station,
+                       QString(77, QLatin1Char('=')),
+                       QStringLiteral("| Điểm |  Khoảng  |"),
+                       QStringLiteral("| mia  |  cách (m)|"),
+                       QString(77, QLatin1Char('-'))};
+      for (int i = 1; i <= rows; ++i) s << QStringLiteral("|%1     |").arg(i);
+      s << QStringLiteral("|      |  100.000 |") << QString(77, QLatin1Char('='));
+      return s.join(QStringLiteral("\r\n"));
+    };
+    const auto pages = SketchPages(section("DC01", 19) + "\r\n" + section("DC02", 1) + "\r\n", 16);
+    QCOMPARE(pages.size(), 3u);
+    QVERIFY(pages[0][0].startsWith(QStringLiteral("Lược đồ số:")));
+    QCOMPARE(pages[0].size(), 16);
+    QCOMPARE(pages[1][1], QStringLiteral("| Điểm |  Khoảng  |"));
+    QCOMPARE(pages[1][4], QStringLiteral("|10     |"));
+    QCOMPARE(pages[1].back(), QString(77, QLatin1Char('=')));
+    QVERIFY(pages[2][0].startsWith(QStringLiteral("Lược đồ số:")));
+    QVERIFY(pages[2][2].endsWith(QStringLiteral("DC02")));
+  }
+
+  // The sketch's font is there and draws every letter of TCVN3 itself, so
+  // that no letter comes from another font of another width.
+  void theSketchFontHasEveryVietnameseLetter() {
+    const QFont font(QString::fromLatin1(kSketchFont));
+    QCOMPARE(QFontInfo(font).family(), QString::fromLatin1(kSketchFont));
+    const QRawFont raw = QRawFont::fromFont(font);
+    std::string bytes;
+    for (int b = 0x80; b <= 0xFF; ++b) bytes += static_cast<char>(b);
+    for (const QChar c : QString::fromStdString(Tcvn3ToUtf8(bytes))) {
+      if (c.isLetter()) QVERIFY2(raw.supportsCharacter(c), qPrintable(QString(c)));
+    }
+  }
+
+  // The README's example computed from the main window with the map ticked:
+  // the map opens by itself; its picture goes to the build folder; the sketch
+  // PDF shows the form's words and the points in Unicode.
+  void theExampleOnTheMapAndItsSketchAsPdf() {
+    Desk desk;
+    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), desk.path("job1.asc")));
+    QVERIFY(desk.w.chooseFile(desk.path("job1.asc")));
+    Child<QCheckBox>(desk.w, "fsdo")->setCheckState(Qt::Checked);
+    Child<QCheckBox>(desk.w, "ckBando")->setChecked(true);
+    QVERIFY(!Child<QPushButton>(desk.w, "bando")->isEnabled());
+    desk.w.tinh_Click();
+    MapWindow& map = desk.w.mapWindow();
+    QVERIFY(map.isVisible());
+    const MapModel& model = map.canvas().model();
+    auto count = [&](MapKind kind) {
+      return std::count_if(model.items.begin(), model.items.end(),
+                           [kind](const MapItem& i) { return i.kind == kind; });
+    };
+    QCOMPARE(count(MapKind::Station), 4);
+    QCOMPARE(count(MapKind::Detail), 100);
+    QCOMPARE(count(MapKind::Peg), 2);
+    QCOMPARE(model.sights.size(), 8u);  // every station has a check record
+    // The picture: zoomed in on the first station far enough to read the
+    // names, the peg CP1 clicked, the cursor on it.
+    map.resize(1000, 760);
+    QVERIFY(QTest::qWaitForWindowExposed(&map));
+    MapCanvas& canvas = map.canvas();
+    const auto cp1 = std::find_if(model.items.begin(), model.items.end(), [](const MapItem& i) {
+      return i.kind == MapKind::Peg && i.name == QStringLiteral("CP1");
+    });
+    QVERIFY(cp1 != model.items.end());
+    canvas.zoomAt(canvas.view().toDevice(cp1->x, cp1->y), 2.5);
+    const QPoint at = canvas.view().toDevice(cp1->x, cp1->y).toPoint();
+    QTest::mouseClick(&canvas, Qt::LeftButton, {}, at);
+    QVERIFY(map.details().contains(QStringLiteral("CP1")));
+    QTest::mouseMove(&canvas, at);
+    QVERIFY(map.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-map-job1.png")));
+
+    const QString pdf = desk.path("job1.pdf");
+    QVERIFY(map.saveSketch(pdf));
+    QVERIFY(ReadAll(pdf).startsWith("%PDF"));
+    const QString pdftotext = QStandardPaths::findExecutable(QStringLiteral("pdftotext"));
+    if (pdftotext.isEmpty()) QSKIP("pdftotext (poppler-utils) is not installed");
+    QProcess text;
+    text.start(pdftotext, {QStringLiteral("-layout"), pdf, QStringLiteral("-")});
+    QVERIFY(text.waitForFinished(20000));
+    const QString shown = QString::fromUtf8(text.readAllStandardOutput());
+    for (const char* words : {"SO DO CHI TIET", "Điểm trạm đo: DC01", "Định hướng 1: DC02",
+                              "Góc bằng", "Chiều cao", "N đường", "CP1"}) {
+      QVERIFY2(shown.contains(QString::fromUtf8(words)), words);
+    }
+  }
+
+  // A field book with known errors, through the run and its error report:
+  // the points the report names are red, a click shows the report's line.
+  void aRunWithErrorsShowsThemInRed() {
+    Desk desk;
+    desk.write("e.asc",
+               "TR DC01 1000.000 2000.000 10.000\r\nTR DC02 1100.000 2000.000 10.000\r\n"
+               "TR DC01 1.50\r\nDKD DC02\r\n1 0900000 50.000 0900000 1.50\r\n"
+               "2 1807500 25.000 0900000 1.50 N\r\n3 0450000 30.000 0900000 1.50\r\n"
+               "3 0457000 30.000 0900000 1.50\r\n");
+    QVERIFY(desk.w.chooseFile(desk.path("e.asc")));
+    desk.w.tinh_Click();
+    QVERIFY(!desk.w.mapWindow().isVisible());  // not ticked: the button opens it
+    desk.w.bando_Click();
+    MapWindow& map = desk.w.mapWindow();
+    QVERIFY(map.isVisible());
+    QStringList red, plain;
+    for (const MapItem& item : map.canvas().model().items) {
+      (item.flagged ? red : plain) << item.name + QLatin1Char('@') + QString::number(item.line);
+    }
+    QCOMPARE(red, QStringList({"2@6", "3@7", "3@8"}));
+    QCOMPARE(plain, QStringList({"DC01@0", "DC02@0", "DC01@3", "1@5"}));
+    const std::size_t two = 4;  // two control points, the station, the points 1 and 2
+    QVERIFY(map.describe(two).contains(QStringLiteral("nhap sai phan phut")));
+    QVERIFY2(map.describe(two).contains(QStringLiteral("2 1807500 25.000 0900000 1.50 N")),
+             qPrintable(map.describe(two)));
+  }
+
+  void theOpenAfterARunBoxIsKept() {
+    {
+      Desk desk;
+      Child<QCheckBox>(desk.w, "ckBando")->setChecked(true);
+      desk.w.close();
+    }
+    QCOMPARE(Stored("KAVU_OpenMap"), QStringLiteral("1"));
+    Desk again;
+    QVERIFY(Child<QCheckBox>(again.w, "ckBando")->isChecked());
+  }
+};
+
+QTEST_MAIN(MapTest)
+#include "map_test.moc"
