@@ -16,8 +16,8 @@
 # A line of mutations.txt: FILE ==> OLD ==> NEW. OLD is an exact text that must
 # occur once in FILE, or "re:" and a regular expression (Python) that must match
 # on exactly one line; NEW replaces it (nothing: the text is dropped). Lines
-# starting with "#" and blank lines are skipped. Faults in ui/
-# build the window too.
+# starting with "#" and blank lines are skipped. Faults in ui/ build the window
+# and run its tests too.
 set -uo pipefail
 cd "$(dirname "$0")/.."
 top=$PWD
@@ -77,6 +77,8 @@ EOF
 [[ $keep == 1 ]] || rm -rf "$work"
 mkdir -p "$work"
 sync_sources
+# The real recordings beside the tree, where the copy's tests look for them.
+[[ -d "$top/../shared" && ! -e "$work/shared" ]] && ln -s "$top/../shared" "$work/shared"
 : >"$work/results.txt"
 [[ $matrix == 1 ]] && : >"$work/matrix.txt"
 
