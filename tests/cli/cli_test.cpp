@@ -216,6 +216,10 @@ TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
     EXPECT_NE(sketch.find(Utf8ToTcvn3(text)), std::string::npos) << option;
   }
   EXPECT_EQ(sketch.find("TOPCOM"), std::string::npos);  // the default was replaced
+  // Surveyor, recorder and date in their widths of 17, 18 and 10.
+  EXPECT_NE(sketch.find(Utf8ToTcvn3("2. Người đo: Nguyễn Văn An    Người ghi: Trần Bình         "
+                                    "Ngày đo:12/5/2004 \r\n")),
+            std::string::npos);
 }
 
 // --- The bundled example -------------------------------------------------
