@@ -201,8 +201,9 @@ TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
   const fs::path dir = FreshFolder();
   WriteBytes(dir / "small.asc", kSmallBook);
   const std::vector<std::pair<std::string, std::string>> header = {
-      {"--area", "Xã Đông Hội"},    {"--sketch-no", "07"},           {"--instrument", "NIKON DTM"},
-      {"--instrument-no", "A1234"}, {"--surveyor", "Nguyễn Văn An"}, {"--recorder", "Trần Bình"},
+      {"--area", "Xã Đông Hội"},       {"--sketch-no", "07"},
+      {"--instrument", "NIKON DTM"},   {"--instrument-no", "A1234"},
+      {"--surveyor", "Nguyễn Văn An"}, {"--recorder", "Trần Thị Bình Minh"},
       {"--date", "12/5/2004"}};
   std::vector<std::string> args = {"--sketch", "--seed", "1"};
   for (const auto& [option, text] : header) {
@@ -216,8 +217,8 @@ TEST(Cli, HeaderTextsReachTheFieldSketchInTcvn3) {
     EXPECT_NE(sketch.find(Utf8ToTcvn3(text)), std::string::npos) << option;
   }
   EXPECT_EQ(sketch.find("TOPCOM"), std::string::npos);  // the default was replaced
-  // Surveyor, recorder and date in their widths of 17, 18 and 10.
-  EXPECT_NE(sketch.find(Utf8ToTcvn3("2. Người đo: Nguyễn Văn An    Người ghi: Trần Bình         "
+  // Surveyor, recorder and date in their widths of 17, 18 (filled) and 10.
+  EXPECT_NE(sketch.find(Utf8ToTcvn3("2. Người đo: Nguyễn Văn An    Người ghi: Trần Thị Bình Minh"
                                     "Ngày đo:12/5/2004 \r\n")),
             std::string::npos);
 }
