@@ -22,7 +22,8 @@ using testing::FreshFolder;
 using testing::WriteBytes;
 
 // Station KC1 at (1000, 1000), H 10, instrument height 1.5; orientation KC2
-// 100 m due north of it, so the orientation azimuth is 0 and its distance 100.
+// 100 m due south of it, so the orientation azimuth (KC2 to the station) is 0
+// and its distance 100; KC3 100 m due east.
 constexpr std::string_view kControl =
     "TR KC1 1000 1000 10\r\nTR KC2 900 1000 10\r\nTR KC3 1000 1100 10\r\n";
 constexpr std::string_view kStation = "TR KC1 1.5\r\nDKD KC2\r\n";
