@@ -2,7 +2,6 @@
 
 #include <gtest/gtest.h>
 
-#include <cmath>
 #include <filesystem>
 
 #include "core/angles.h"
@@ -16,7 +15,7 @@ namespace {
 TEST(Text, TrimTouchesOnlySpaces) {
   EXPECT_EQ(Trim("  \ta b\t  "), "\ta b\t");
   EXPECT_EQ(Trim("   "), "");
-  EXPECT_EQ(Upper("kt\xB5z"), "KT\xB5Z");
+  EXPECT_EQ(Upper("akt\xB5z"), "AKT\xB5Z");
   EXPECT_EQ(FixedWidth("abc", 5), "abc  ");
   EXPECT_EQ(FixedWidth("abcdefg", 5), "abcde");
   FixedText<12> name;
@@ -25,14 +24,22 @@ TEST(Text, TrimTouchesOnlySpaces) {
   EXPECT_EQ(name.str(), "DC05        ");
 }
 
+// RString and LString decide on the untrimmed length and pad the trimmed
+// text; a text as long as the width or longer is returned as it stands.
 TEST(Text, AlignDecidesOnUntrimmedLengthAndNeverCuts) {
-  EXPECT_EQ(RString("ab", 5), "   ab");
-  EXPECT_EQ(LString("ab", 5), "ab   ");
-  EXPECT_EQ(RString(" ab ", 5), "   ab");
-  EXPECT_EQ(LString(" ab ", 5), "ab   ");
-  EXPECT_EQ(RString("  ab", 4), "  ab");
-  EXPECT_EQ(RString("abcdef", 4), "abcdef");
-  EXPECT_EQ(RString("ab", -1), "ab");
+  struct Case {
+    const char* text;
+    int width;
+    const char* right;
+    const char* left;
+  };
+  for (const Case& c : {Case{"ab", 5, "   ab", "ab   "}, Case{"ab  ", 5, "   ab", "ab   "},
+                        Case{" ab ", 5, "   ab", "ab   "}, Case{"ab  ", 4, "ab  ", "ab  "},
+                        Case{"  ab", 4, "  ab", "  ab"}, Case{"abcdef", 4, "abcdef", "abcdef"},
+                        Case{"", 3, "   ", "   "}, Case{"ab", -1, "ab", "ab"}}) {
+    EXPECT_EQ(RString(c.text, c.width), c.right) << "'" << c.text << "' " << c.width;
+    EXPECT_EQ(LString(c.text, c.width), c.left) << "'" << c.text << "' " << c.width;
+  }
 }
 
 TEST(Text, KTraCCGTrimsAndFlagsOtherCharacters) {
@@ -42,18 +49,6 @@ TEST(Text, KTraCCGTrimsAndFlagsOtherCharacters) {
   for (std::string t : {"1,55", "-1", "M12", "1 2"}) EXPECT_EQ(KTraCCG(t), 1) << t;
   std::string empty;
   EXPECT_EQ(KTraCCG(empty), 0);
-}
-
-TEST(Text, SplitFieldsNormalisesTheLine) {
-  std::string line = "P7\t\t1234530   45.210 \t0901500 1.50";
-  const auto fields = SplitFields(line);
-  EXPECT_EQ(line, "P7 1234530 45.210 0901500 1.50");
-  ASSERT_EQ(fields.size(), 5u);
-  EXPECT_EQ(fields[2], "45.210");
-  std::string tab_first = "\tK1 0";  // only spaces are trimmed before the tabs turn into spaces
-  EXPECT_EQ(SplitFields(tab_first), (std::vector<std::string>{"", "K1", "0"}));
-  std::string empty;
-  EXPECT_TRUE(SplitFields(empty).empty());
 }
 
 TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
@@ -67,18 +62,18 @@ TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   EXPECT_EQ(GocStringText(359.99999), "   0 00 00");  // carry wraps 360 to 0
   EXPECT_EQ(GocStringText(1000), " 640 00 00");       // 360 taken off once only
   EXPECT_EQ(GocStringText(-0.00001), "  -0 00 00");
+  // Rounded twice: to a tenth, then to the even second (31.46 -> 31.5 -> 32).
+  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 31.46 / 3600), " 123 45 32");
+  EXPECT_EQ(GocStringText(123 + 45 / 60.0 + 30.46 / 3600), " 123 45 30");
+  EXPECT_EQ(GocStringText(-(5 + 59 / 60.0 + 59.96 / 3600)), "  -6 00 00");
+  EXPECT_EQ(GocStringText(5 + 59 / 60.0 + 59.5 / 3600), "   6 00 00");  // 60" then 60'
+
+  EXPECT_EQ(GocSt(359.99999), "    00000");
   EXPECT_EQ(GocSt(123.7584722), "  1234530");
   EXPECT_EQ(GocSt(-12.5), "  -123000");
   EXPECT_EQ(GocSt(5.0691666667), "    50409");
   EXPECT_EQ(GocSt1(5.0691666667), "  5 04 09");
   EXPECT_EQ(GocSt1(-123.7584722), "-123 45 30");  // 10 characters, not cut
-}
-
-TEST(Angles, CvGocDblReadsPackedColumns) {
-  EXPECT_NEAR(CvGocDbl("1234530"), 123 + 45 / 60.0 + 30 / 3600.0, 1e-12);
-  EXPECT_NEAR(CvGocDbl("450"), 4 / 60.0 + 50 / 3600.0, 1e-12);  // read as 0000450
-  EXPECT_EQ(CvGocDbl(""), 0);
-  EXPECT_TRUE(std::isfinite(CvGocDbl("-99999999999")));
 }
 
 TEST(Lines, EveryLineEndCounts) {

@@ -2,14 +2,16 @@
 
 #include <gtest/gtest.h>
 
-#include <filesystem>
-
-#include "support.h"
+#include <cctype>
+#include <string>
 
 namespace kavu {
 namespace {
 
-namespace fs = std::filesystem;
+std::string Lower(std::string text) {
+  for (char& c : text) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
+  return text;
+}
 
 // The names of a path, native on each system: on Windows with drive letters
 // and backslashes (the system's absolute path gives the TRIDO folder).
@@ -66,37 +68,14 @@ TEST(DeriveFileSelection, ProductsAreNamedAfterTheFileNameOnly) {
 
 TEST(KindOfExtension, UpperCaseExtensionsSelectTheirKindAndPattern) {
   const char* extensions[] = {"ASC", "SDR", "OBS", "SET", "RAW", "IDX", "TCM", "GRE", "DN7"};
-  for (int k = 0; k < 9; ++k) EXPECT_EQ(KindOfExtension(extensions[k]), k);
+  for (int k = 0; k < 9; ++k) {
+    EXPECT_EQ(KindOfExtension(extensions[k]), k);
+    EXPECT_EQ(PatternOfKind(k), "*." + Lower(extensions[k]));
+  }
   EXPECT_EQ(KindOfExtension("sdr"), 9);
   EXPECT_EQ(KindOfExtension("TXT"), 9);
-  EXPECT_EQ(PatternOfKind(6), "*.tcm");
   EXPECT_EQ(PatternOfKind(9), "*.*");
   EXPECT_EQ(PatternOfKind(42), "*.*");
-}
-
-TEST(CheckAndConvert, KindComesFromTheExtensionUnlessOverriddenAndHeaderIsCut) {
-  const fs::path folder = testing::FreshFolder();
-  testing::WriteBytes(folder / "job.TXT", "anything\r\n");
-  testing::WriteBytes(folder / "job.asc", "TR A 1.5\r\n");
-  testing::RecordingHost host;
-  RunState st;
-  st.txtfile = (folder / "job.TXT").string();
-  st.fsdo = 1;
-  st.nhapsdo[1] = "sketch number longer than six";
-  const auto lines = CheckAndConvert(st, host);
-  ASSERT_TRUE(lines);
-  EXPECT_EQ(SplitLines(*lines), std::vector<std::string>{"TR A 1.5"});
-  EXPECT_EQ(st.filesl, (folder / "job.asc").string());
-  EXPECT_EQ(host.fileBox, st.filesl);
-  EXPECT_EQ(st.cbkieu, 0);
-  EXPECT_EQ(st.nhap[1], "sketch");
-  EXPECT_EQ(st.nhap[6], std::string(10, ' '));
-
-  // Told it is a field book, the chosen file itself is read.
-  RunState told;
-  told.txtfile = (folder / "job.TXT").string();
-  told.kindOverride = 0;
-  EXPECT_EQ(SplitLines(*CheckAndConvert(told, host)), std::vector<std::string>{"anything"});
 }
 
 }  // namespace

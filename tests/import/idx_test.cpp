@@ -24,35 +24,17 @@ TEST(ConvertIdx, GoldenEveryQuirk) {
   EXPECT_EQ(ConvertIdx(TestData("idx/quirks.idx")).book, TestData("idx/quirks.asc"));
 }
 
-// The end of the file ends the conversion wherever it falls; what was written
-// stays.
-TEST(ConvertIdx, FileEndingInsideABlockKeepsWhatWasWritten) {
-  const std::string stn = "STN_ID \"S1\"\n";
-  const std::string ht = "INST_HT 1.5;\n";
-  const std::string obs = "1,\"P1\",1,90,90,12.5,1.5\n";
-  const std::string tr = "TR S1  1.5 \r\n";
-  // Readings turn to the orientation: P1 orients, read at 90.
-  const std::string detail = "P1       00000   12.500   900000    1.5\r\n";
-  EXPECT_EQ(ConvertIdx(stn).book, "");
-  EXPECT_EQ(ConvertIdx(stn + ht).book, tr);
-  EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\n").book, tr);
-  EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\n" + obs).book, tr + "DKD P1\r\n" + detail);
-  EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\n" + obs + obs).book, tr + "DKD P1\r\n" + detail + detail);
-  // A STN_ID where the first observation should be: a station without one.
-  EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\n" + stn + ht + "a\nb\n" + obs).book,
-            tr + tr + "DKD P1\r\n" + detail);
-  // END SLOPE as the first observation: the orientation has no name.
-  EXPECT_EQ(ConvertIdx(stn + ht + "a\nb\nEND SLOPE\n" + obs).book, tr + "DKD \r\n");
-}
-
-TEST(ConvertIdx, NamesPassThroughByteForByte) {
-  // TCVN3 letters and a NUL inside quoted names; a long name is not cut.
-  const std::string name("\xae\xad\xeang\0x", 6);
-  const std::string file = "STN_ID \"" + name + "\"\nINST_HT 2;\n\n\n1,\"" + name +
-                           "\",1,0,90,5,0\n1,\"" + name + "12345\",1,0,90,5,0\n";
-  EXPECT_EQ(ConvertIdx(file).book, "TR " + name + "  2 \r\nDKD " + name + "\r\n" + name +
-                                       "    00000    5.000   900000      0\r\n" + name +
-                                       "12345    00000    5.000   900000      0\r\n");
+// Degrees, minutes and seconds: Q at 45.3000 is 45 30 00. P's two faces,
+// 0 10 00 and 179 50 00 at zenith 270 (359 50 00), straddle 0: their mean is
+// 0 00 00, not 180.
+TEST(ConvertIdx, DmsReadingsAndFacesAcrossZero) {
+  const std::string file =
+      "ANGULAR DMS\nSTN_ID \"S\"\nINST_HT 1.5;\n\n\n1,\"B\",1,0,90,10,0\n"
+      "2,\"Q\",1,45.3000,90,10,0\n3,\"P\",1,0.1000,90,10,0\n4,\"P\",1,179.5000,270,10,0\n";
+  EXPECT_EQ(
+      ConvertIdx(file).book,
+      "TR S  1.5 \r\nDKD B\r\nB        00000   10.000   900000      0\r\n"
+      "Q       453000   10.000   900000      0\r\nP        00000   10.000   900000      0\r\n");
 }
 
 TEST(ConvertIdx, BadInputEndsWithABoundedFieldBook) {

@@ -40,17 +40,6 @@ inline int CountStarting(std::string_view book, std::string_view prefix) {
 
 inline int CountLines(std::string_view book) { return static_cast<int>(SplitLines(book).size()); }
 
-// Every line of a field book ends in CR LF and there is no stray CR or LF.
-inline bool AllLinesCrLf(std::string_view book) {
-  std::size_t pos = 0;
-  while (pos < book.size()) {
-    const std::size_t cr = book.find_first_of("\r\n", pos);
-    if (cr == std::string_view::npos || book.substr(cr, 2) != "\r\n") return false;
-    pos = cr + 2;
-  }
-  return true;
-}
-
 struct Xy {
   double x = 0, y = 0;
 };

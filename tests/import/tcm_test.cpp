@@ -52,14 +52,17 @@ TEST(ConvertTcm, LookAheadAtTheEnds) {
           .book,
       "TR A 0.0\r\nDKD \r\n0          00003    10.000    900000    1.50 \r\n"
       "TR B 1\r\n7          10000    10.000    900000    1.50 \r\n");
-}
-
-TEST(ConvertTcm, MoreThan4999RecordsAreAllWritten) {
-  std::string file = "header\r\nST1         1.45\r\n" + Obs("0", "0", "0000", "K2");
-  for (int k = 1; k <= 6000; ++k) file += "\r\n" + Obs(std::to_string(k), "10", "0000");
-  const std::vector<std::string> lines = SplitLines(ConvertTcm(file).book);
-  ASSERT_EQ(lines.size(), 2u + 6001u);
-  EXPECT_EQ(lines.back(), "6000      100000    10.000    900000    1.50 ");
+  // 360 00 00 turns to 0; a reading of 0 00 05 still orients, and 90 00 00
+  // then turns to 89 59 55; column 74, run into, is no part of the description.
+  std::string run_together = Obs("8", "90", "0000", "ABC");
+  run_together[73] = '*';
+  EXPECT_EQ(ConvertTcm("h\nA\n" + Obs("0", "0", "0000", "DC05") + "\n" + Obs("7", "360", "0000") +
+                       "\nB\n" + Obs("1", "0", "0005", "DC06") + "\n" + run_together)
+                .book,
+            "TR A 0.0\r\nDKD DC05\r\n0              0    10.000    900000    1.50 DC05\r\n"
+            "7          00000    10.000    900000    1.50 \r\nTR B 0.0\r\nDKD DC06\r\n"
+            "1          00005    10.000    900000    1.50 DC06\r\n"
+            "8         895955    10.000    900000    1.50 ABC\r\n");
 }
 
 TEST(ConvertTcm, BadInputEndsWithABoundedFieldBook) {

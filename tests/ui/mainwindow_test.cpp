@@ -250,9 +250,14 @@ class MainWindowTest : public QObject {
     MainWindow& w = desk.w;
     QVERIFY(ShowExample(desk));
     w.show();
-    // The close box pressed while the title shows the first station.
-    connect(&w, &QWidget::windowTitleChanged, &w, [&w](const QString& title) {
-      if (title.startsWith(Q(msg::kStationTitle))) w.close();
+    // The close box and the compute button pressed while the title shows
+    // the first station.
+    bool pressed = false;
+    connect(&w, &QWidget::windowTitleChanged, &w, [&w, &pressed](const QString& title) {
+      if (!title.startsWith(Q(msg::kStationTitle)) || pressed) return;
+      pressed = true;
+      w.close();
+      w.tinh_Click();
     });
     w.SetFileBox(Native(desk.path("job1.asc")).toStdString());
     w.tinh_Click();

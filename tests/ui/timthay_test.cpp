@@ -163,6 +163,14 @@ class TimthayTest : public QObject {
       QCOMPARE(bench.selLength(), c.selLength);
       QCOMPARE(bench.person.asked.size(), 0u);
     }
+    // Replaced by nothing at the start: the next match, now at the start too,
+    // is shown.
+    Bench empty(QStringLiteral("aab"), QStringLiteral("a"));
+    empty.select(0, 1);
+    empty.press("thay1");
+    QCOMPARE(empty.text.toPlainText(), QStringLiteral("ab"));
+    QCOMPARE(empty.selStart(), 0);
+    QCOMPARE(empty.selLength(), 1);
 
     // Nothing found: the question, the text unchanged on either answer; No
     // closes the window.
