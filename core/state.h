@@ -118,27 +118,22 @@ struct ComputationFields {
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;
-  std::vector<std::string> MangSoLieuASC;
-  std::vector<std::string> MangSoLieuToaDo;
   std::vector<SketchRow> MangSoLieuSoDo;
   std::vector<PegEntry> MangCocPhu;
-  std::string ChuoiKC;
 
   // Lookup indexes of the tables above by trimmed name, brought up to date
   // when a point is looked up: positions in MangKhongChe and
-  // survey.points, the names of the lines of ChuoiKC, the names of
+  // survey.points, the names in survey.controlListing, the names of
   // survey.control.
   struct NameIndex {
     std::unordered_map<std::string, std::vector<std::size_t>> positions;
     std::size_t done = 0;
   };
   NameIndex knownIndex, detailIndex;
-  std::unordered_set<std::string> chuoiKCNames;
-  std::size_t chuoiKCRead = 0;
+  std::unordered_set<std::string> listedNames;
   std::unordered_set<std::string> controlNames;
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
-  int sdasc() const { return static_cast<int>(MangSoLieuASC.size()); }
   int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
   int sdcp() const { return static_cast<int>(MangCocPhu.size()); }
 

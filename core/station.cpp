@@ -107,7 +107,7 @@ void Orient(RunState& st, const std::string& otherName) {
 
 // A computed detail point or peg, as the products write its coordinates.
 void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string code,
-               std::string note) {
+               std::string note, bool listed) {
   ComputedPoint point;
   point.name = Trim(name);
   point.x = st.xi;
@@ -119,6 +119,9 @@ void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string 
   point.kind = kind;
   point.station = st.survey.stations.size() - 1;
   point.line = st.line;
+  point.prism = st.ccg;
+  point.record = st.dong;
+  point.listed = listed;
   st.survey.points.push_back(std::move(point));
 }
 
@@ -201,7 +204,6 @@ void ReportLongName(RunState& st, std::string_view name) {
 void STP5(RunState& st) {
   ReportLongName(st, st.Field(0));
   if (!ObservationUsable(st)) return;
-  st.MangSoLieuASC.push_back(st.dong);
   if (st.dctdau == 1) {
     st.DiemDau = st.TenDiem.str();
     st.DiemCuoi = st.TenDiem.str();
@@ -216,8 +218,9 @@ void STP5(RunState& st) {
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
   auto [code, note] = CodeAndNote(st);
-  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note));
-  GhiMangSoLieuToaDo(st);
+  // Descriptive words are the code; a record without them is listed too.
+  const bool listed = st.stp == 5 || !code.empty();
+  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note), listed);
   GhiMangSoLieuVaoSoDo(st);
 }
 
@@ -239,7 +242,6 @@ void STP6(RunState& st) {
   }
   ReportLongName(st, st.Field(5));
   if (!ObservationUsable(st)) return;
-  st.MangSoLieuASC.push_back(st.dong);
   st.s = Val(st.Field(2));
   st.goc = Val(st.Field(3));
   st.ccg = Val(st.Field(4));
@@ -247,12 +249,13 @@ void STP6(RunState& st) {
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
   NotePoint(st, PointKind::Peg, st.TenKC.str(), std::string(),
-            st.stp > 6 ? st.Field(6) : std::string());
-  // The peg becomes a known point for the rest of the run.
+            st.stp > 6 ? st.Field(6) : std::string(), false);
+  // The peg becomes a known point for the rest of the run, listed with its
+  // height and note.
   st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
-  std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
-  if (st.stp > 6) line += " " + st.Field(6);
-  st.ChuoiKC += line + "\r\n";
+  const std::string name = Trim(st.TenKC.str());
+  st.listedNames.insert(name);
+  st.survey.controlListing.push_back({name, st.survey.points.size() - 1, {}, {}, {}, true});
   st.MangCocPhu.push_back({"", st.Field(5), st.Field(1), st.Field(2), st.Field(3), st.Field(4),
                            st.stp > 6 ? st.Field(6) : std::string()});
 }

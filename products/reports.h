@@ -20,6 +20,11 @@ bool ProductOverInput(RunState& st, const std::string& path);
 // its .td1, the .txt. Unwritable ones are added to st.unwritable.
 void WriteTextProducts(RunState& st);
 
+// A line of the control-point listing (.kc and the head of the TRIDO book and
+// .td1), and a detail point's line of the coordinate listing (.td1).
+std::string ControlListingLine(const Survey& survey, const ControlListing& entry);
+std::string CoordinateListingLine(const ComputedPoint& point);
+
 // A line of the coordinate text file for a computed detail point.
 std::string CoordinateTextLine(const ComputedPoint& point, int decimals);
 

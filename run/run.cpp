@@ -64,13 +64,6 @@ class WorkingCopy {
   std::size_t next_ = 0;
 };
 
-// The lengths of the two lists of the regenerated field book stay equal to
-// the count of its lines.
-void DropStationEntries(RunState& st, std::size_t keep) {
-  st.MangSoLieuASC.resize(keep);
-  if (st.MangSoLieuToaDo.size() > keep) st.MangSoLieuToaDo.resize(keep);
-}
-
 void HandleBodyRecord(RunState& st) {
   const std::size_t stp = st.MangTruong.size();
   auto codeIsPegName = [&] {
@@ -123,6 +116,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   station.bearing = st.gpv >= 180 ? st.gpv - 180 : st.gpv + 180;
   station.orientationDistance = st.cdhdau;
   station.line = recordLine;
+  station.instrumentHeight = st.ccm;
   st.survey.stations.push_back(std::move(station));
   st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
   if (Ticked(st.fsdo)) {
@@ -131,15 +125,6 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     st.StYDinhHuong2.clear();
     st.StSaiGoc.clear();
   }
-  const std::string stationLine = "TR " + st.TenTram.str() + " " + st.ccm;
-  const std::string orientationLine = "DKD " + st.TenDinhHuong.str();
-  st.MangSoLieuToaDo.resize(st.MangSoLieuASC.size());
-  for (const std::string& line : {stationLine, orientationLine}) {
-    st.MangSoLieuASC.push_back(line);
-    st.MangSoLieuToaDo.push_back(line);
-  }
-  const std::size_t bodyStart = st.MangSoLieuASC.size();
-
   // An orientation record on the last line leaves the station without a body.
   const bool hasBody = !copy.AtEnd();
   copy.ReadLine();
@@ -155,7 +140,6 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     copy.ReadLine();
     st.TenDiem = st.Field(0);
   }
-  if (st.MangSoLieuASC.size() == bodyStart) DropStationEntries(st, bodyStart - 2);
   st.cpvFile.Line(st.DongTram + "    " + st.DiemDau.str() + " -  " + st.DiemCuoi.str());
   insodo(st);
   incocphu(st);
@@ -313,7 +297,8 @@ RunResult tinh_Click(RunState& st, Host& host) {
   // The working copy holds all the run reads of the field book from here on.
   fieldBook.reset();
   WritePegFileHead(st);
-  st.ChuoiKC.clear();
+  st.survey.controlListing.clear();
+  st.listedNames.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
   if (st.tamsl.empty()) {
