@@ -97,7 +97,6 @@ struct ComputationFields {
   std::string ccm;
   FixedText<5> DiemDau, DiemCuoi;
   std::int16_t dctdau = 1;
-  std::string DongTram;
   std::string DongDinhHuong2;
   FixedText<12> TenDinhHuong2;
   std::string StXDinhHuong2, StYDinhHuong2, StSaiGoc;
@@ -114,7 +113,7 @@ struct ComputationFields {
   // Coordinate and distance texts are padded to their widths, never cut.
   FixedNumber<11> StX;
   FixedNumber<10> StY, StZ;
-  FixedNumber<8> StS, StCanh;
+  FixedNumber<8> StS;
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;

@@ -100,9 +100,6 @@ void Orient(RunState& st, const std::string& otherName) {
                     otherName + std::string(msg::kWrongCoordinates),
                 st.TenTram.str());
   }
-  st.StCanh = Mask(RoundEven(st.cdh, 3), "####.000");
-  const std::string trimmed = Trim(st.StCanh.str());
-  if (trimmed.size() < 8) st.StCanh = std::string(8 - trimmed.size(), ' ') + trimmed;
 }
 
 // A computed detail point or peg, as the products write its coordinates.

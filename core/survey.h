@@ -29,6 +29,7 @@ struct StationResult {
   std::optional<double> checkResidual;  // check sight minus computed angle, degrees
   std::size_t line = 0;                 // field-book line of the station record (from 1)
   std::string instrumentHeight = {};    // the station record's instrument height, as it stands
+  double backBearing = 0;               // azimuth orientation -> station, degrees, as computed
 };
 
 enum class PointKind { Detail, Peg };

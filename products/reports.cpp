@@ -5,6 +5,7 @@
 #include <optional>
 #include <string>
 
+#include "core/angles.h"
 #include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
@@ -26,6 +27,32 @@ void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report) {
 
 void WriteStationListingHeader(TextOut& out) {
   for (std::string_view line : msg::kCpvHeader) out.Line(line);
+}
+
+std::string OrientationDistanceText(double distance) {
+  return NumberWidth(RString(Mask(distance, "####.000"), 8), 8);
+}
+
+void WriteStationListing(TextOut& out, const Survey& survey) {
+  // The first and last detail point of each station.
+  struct Ends {
+    std::string_view first, last;
+    bool any = false;
+  };
+  std::vector<Ends> ends(survey.stations.size());
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind != PointKind::Detail) continue;
+    Ends& e = ends[point.station];
+    if (!e.any) e.first = point.name;
+    e.last = point.name;
+    e.any = true;
+  }
+  for (std::size_t i = 0; i < survey.stations.size(); ++i) {
+    const StationResult& s = survey.stations[i];
+    out.Line(FixedWidth(s.station.name, 12) + FixedWidth(s.orientation.name, 12) + " " +
+             GocStringText(s.backBearing) + " " + OrientationDistanceText(s.orientationDistance) +
+             "    " + FixedWidth(ends[i].first, 5) + " -  " + FixedWidth(ends[i].last, 5));
+  }
 }
 
 std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {

@@ -11,6 +11,13 @@ namespace kavu {
 // an empty line.
 void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report);
 void WriteStationListingHeader(TextOut& out);
+// The station listing's line for each computed station: station, orientation,
+// azimuth from the orientation point, orientation distance, first and last
+// detail point.
+void WriteStationListing(TextOut& out, const Survey& survey);
+// An orientation distance in its 8 columns, as the listing and the field
+// sketch show it.
+std::string OrientationDistanceText(double distance);
 
 // True when the product at path would replace a file the run reads: it is
 // then named in st.unwritable and must be passed over.

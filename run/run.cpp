@@ -117,8 +117,8 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   station.orientationDistance = st.cdhdau;
   station.line = recordLine;
   station.instrumentHeight = st.ccm;
+  station.backBearing = st.gpv;
   st.survey.stations.push_back(std::move(station));
-  st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
   if (Ticked(st.fsdo)) {
     st.TenDinhHuong2 = "";
     st.StXDinhHuong2.clear();
@@ -140,7 +140,6 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     copy.ReadLine();
     st.TenDiem = st.Field(0);
   }
-  st.cpvFile.Line(st.DongTram + "    " + st.DiemDau.str() + " -  " + st.DiemCuoi.str());
   insodo(st);
   incocphu(st);
 }
@@ -192,7 +191,6 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
     st.ccm = st.Field(2);
-    st.DongTram = st.TenKC.str();
     // A height that is no number is as good as none: computed with 0.
     if (!HasNumber(st.ccm)) {
       ReportError(st,
@@ -213,7 +211,6 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   if (st.Field(0).starts_with("DKD") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
-    st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);
     st.TenDinhHuong = st.TenKC.str();
     TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
@@ -340,6 +337,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     st.cpvFile.abandon();
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
+    WriteStationListing(st.cpvFile, st.survey);
     CommitKeptFile(st, st.cpvFile);
     WriteErrorReport(st.errFile, st.survey.report);
     CommitKeptFile(st, st.errFile);
