@@ -65,8 +65,6 @@ using KnownPoint = std::array<std::string, 4>;
 // A field-sketch row: name, horizontal angle, distance, vertical angle, prism
 // height, note.
 using SketchRow = std::array<std::string, 6>;
-// An auxiliary peg: blank, name, reading, distance, zenith, prism height, note.
-using PegEntry = std::array<std::string, 7>;
 
 struct ComputationFields {
   std::int32_t err = 0;  // data errors written to the error report
@@ -97,7 +95,6 @@ struct ComputationFields {
   std::string ccm;
   FixedText<5> DiemDau, DiemCuoi;
   std::int16_t dctdau = 1;
-  std::string DongDinhHuong2;
   FixedText<12> TenDinhHuong2;
   std::string StXDinhHuong2, StYDinhHuong2, StSaiGoc;
   double pvd = 0, cdhdau = 0, dscdh = 0.05;
@@ -118,7 +115,6 @@ struct ComputationFields {
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;
   std::vector<SketchRow> MangSoLieuSoDo;
-  std::vector<PegEntry> MangCocPhu;
 
   // Lookup indexes of the tables above by trimmed name, brought up to date
   // when a point is looked up: positions in MangKhongChe and
@@ -134,7 +130,6 @@ struct ComputationFields {
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
   int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
-  int sdcp() const { return static_cast<int>(MangCocPhu.size()); }
 
   // The working copy of the field book (without its control-point records),
   // held in memory so that runs never share a file.

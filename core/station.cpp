@@ -253,15 +253,14 @@ void STP6(RunState& st) {
   const std::string name = Trim(st.TenKC.str());
   st.listedNames.insert(name);
   st.survey.controlListing.push_back({name, st.survey.points.size() - 1, {}, {}, {}, true});
-  st.MangCocPhu.push_back({"", st.Field(5), st.Field(1), st.Field(2), st.Field(3), st.Field(4),
-                           st.stp > 6 ? st.Field(6) : std::string()});
 }
 
 void STP7(RunState& st) {
   if (NumbersMissing(st, {1, 2})) return;
   st.TenKC = st.Field(5);
   st.TenDinhHuong2 = st.TenKC.str();
-  st.DongDinhHuong2 = "DKD2 " + st.TenKC.str();
+  std::string& checkRecord = st.survey.stations.back().checkRecord;
+  checkRecord = "DKD2 " + st.TenKC.str();
   // The record's own distance is the one checked.
   st.s = Val(st.Field(2));
   st.goc = Val(st.Field(1));
@@ -293,9 +292,9 @@ void STP7(RunState& st) {
     st.StSaiGoc.clear();
     st.StXDinhHuong2.clear();
     st.StYDinhHuong2.clear();
-    st.DongDinhHuong2 += " " + st.Field(1);
+    checkRecord += " " + st.Field(1);
   } else if (Val(Trim(st.Field(1))) != 0) {
-    st.DongDinhHuong2 += " " + st.Field(1);
+    checkRecord += " " + st.Field(1);
   } else {
     // No reading was recorded: make one from the computed angle, within half
     // a minute of it.
@@ -311,9 +310,9 @@ void STP7(RunState& st) {
     }
     GocString(st);
     st.StGoc = Trim(Mask(Val(st.StGoc), "#######"));
-    st.DongDinhHuong2 += " " + st.StGoc;
+    checkRecord += " " + st.StGoc;
   }
-  st.DongDinhHuong2 += " " + st.Field(2);
+  checkRecord += " " + st.Field(2);
 }
 
 }  // namespace kavu

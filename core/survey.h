@@ -30,6 +30,10 @@ struct StationResult {
   std::size_t line = 0;                 // field-book line of the station record (from 1)
   std::string instrumentHeight = {};    // the station record's instrument height, as it stands
   double backBearing = 0;               // azimuth orientation -> station, degrees, as computed
+  // The station's last check record as the peg file repeats it: "DKD2", the
+  // check point, the reading (made up from the computed angle when none was
+  // recorded), the distance; empty without one.
+  std::string checkRecord = {};
 };
 
 enum class PointKind { Detail, Peg };

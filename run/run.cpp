@@ -132,7 +132,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   st.DiemDau = "";
   st.DiemCuoi = "";
   st.dctdau = 1;
-  st.DongDinhHuong2.clear();
+  const std::size_t firstPoint = st.survey.points.size();
   while (hasBody && Trim(st.TenDiem.str()) != "TR") {
     ++counters.bodyRecords;
     HandleBodyRecord(st);
@@ -141,7 +141,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     st.TenDiem = st.Field(0);
   }
   insodo(st);
-  incocphu(st);
+  CheckPegReadings(st, firstPoint);
 }
 
 void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
@@ -186,7 +186,6 @@ void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& te
 void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
   st.MangSoLieuSoDo.clear();
-  st.MangCocPhu.clear();
   if (st.Field(0).starts_with("TR") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
@@ -346,6 +345,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.fdxf) && !ProductOverInput(st, st.daufile + ".dxf") && !indxf(st)) {
     st.unwritable.push_back(st.daufile + ".dxf");
   }
+  if (Ticked(st.fcp)) WritePegBlocks(st.cpFile, st.survey);
   CommitKeptFile(st, st.cpFile);
   CommitKeptFile(st, st.sdoFile);
   if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");
