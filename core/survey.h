@@ -49,7 +49,7 @@ struct ComputedPoint {
   std::size_t line = 0;     // field-book line of its record (from 1)
   double z = 0;             // the height as computed, unrounded (also with heights off)
   double prism = 0;         // the prism height of its record
-  std::string record;       // its record line, fields set off by single spaces
+  std::string record = {};  // its record line, fields set off by single spaces
   // Whether the coordinate listing (.td1) gives it a line: a detail point
   // whose record has no words after the prism height, or descriptive words.
   bool listed = false;
