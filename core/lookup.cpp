@@ -22,38 +22,18 @@ std::string ControlLine(const std::string& name12, const std::string& x11, const
 
 namespace {
 
-void AppendControlLine(RunState& st) {
-  st.ChuoiKC += ControlLine(st.TenKC, st.StX, st.StY, Ticked(st.fdc) ? &st.StZ.str() : nullptr);
-  st.ChuoiKC += "\r\n";
-}
-
-// Whether ChuoiKC already holds a line for the point: the name field of each
-// line (after "TR "), trimmed, is compared whole, so that "3" is not found in
-// the line of "1003". The lines added since the last lookup are read first.
-bool ChuoiKCHas(RunState& st, std::string_view name) {
-  constexpr std::string_view kHead = "TR ";
-  constexpr std::size_t kNameWidth = decltype(RunState::TenKC)::kWidth;
-  const std::string_view chuoi = st.ChuoiKC;
-  if (st.chuoiKCRead > chuoi.size()) {
-    st.chuoiKCNames.clear();
-    st.chuoiKCRead = 0;
+// A line of the control-point listing for the point looked up: a known point
+// with its coordinate texts, or (point) a point of this run.
+void AppendControlLine(RunState& st, std::string_view name,
+                       std::optional<std::size_t> point = std::nullopt) {
+  ControlListing entry{std::string(name), point, {}, {}, {}, Ticked(st.fdc)};
+  if (!point) {
+    entry.x = st.StX.str();
+    entry.y = st.StY.str();
+    entry.z = st.StZ.str();
   }
-  std::size_t start = st.chuoiKCRead;
-  while (start < chuoi.size()) {
-    std::size_t end = chuoi.find("\r\n", start);
-    // A line not yet ended is read again with its end.
-    if (end == std::string_view::npos) break;
-    const std::string_view line = chuoi.substr(start, end - start);
-    if (line.starts_with(kHead)) {
-      st.chuoiKCNames.emplace(TrimView(line.substr(kHead.size(), kNameWidth)));
-    }
-    start = end + 2;
-  }
-  st.chuoiKCRead = start;
-  if (st.chuoiKCNames.contains(std::string(name))) return true;
-  // The unended last line, if any.
-  const std::string_view rest = chuoi.substr(start);
-  return rest.starts_with(kHead) && TrimView(rest.substr(kHead.size(), kNameWidth)) == name;
+  st.listedNames.emplace(name);
+  st.survey.controlListing.push_back(std::move(entry));
 }
 
 // The positions of name in a table, in order; nameOf gives a row's trimmed
@@ -104,7 +84,7 @@ void TimToaDoDiem(RunState& st) {
     st.StX = point[1];
     st.StY = point[2];
     st.StZ = point[3];
-    if (!ChuoiKCHas(st, name)) AppendControlLine(st);
+    if (!st.listedNames.contains(wanted)) AppendControlLine(st, name);
     if (st.n > 1) {
       const double x = RoundEven(Val(st.StX.str()), 3);
       const double y = RoundEven(Val(st.StY.str()), 3);
@@ -140,7 +120,7 @@ void TimToaDoDiem(RunState& st) {
     st.StZ = HeightText(point.z);
     if (st.n == 1) TakeCoordinates(st);
     st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
-    AppendControlLine(st);
+    AppendControlLine(st, name, position);
   }
   if (st.n != 0) NoteControlPoint(st, name);
   if (st.n == 0) {

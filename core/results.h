@@ -12,7 +12,9 @@ bool DescriptiveWords(RunState& st);
 // file shows them.
 std::pair<std::string, std::string> CodeAndNote(RunState& st);
 
-void GhiMangSoLieuToaDo(RunState& st);
+// A prism height as the record listings write it.
+std::string PrismText(double ccg);
+
 void GhiMangSoLieuVaoSoDo(RunState& st);
 
 }  // namespace kavu

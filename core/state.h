@@ -65,8 +65,6 @@ using KnownPoint = std::array<std::string, 4>;
 // A field-sketch row: name, horizontal angle, distance, vertical angle, prism
 // height, note.
 using SketchRow = std::array<std::string, 6>;
-// An auxiliary peg: blank, name, reading, distance, zenith, prism height, note.
-using PegEntry = std::array<std::string, 7>;
 
 struct ComputationFields {
   std::int32_t err = 0;  // data errors written to the error report
@@ -97,8 +95,6 @@ struct ComputationFields {
   std::string ccm;
   FixedText<5> DiemDau, DiemCuoi;
   std::int16_t dctdau = 1;
-  std::string DongTram;
-  std::string DongDinhHuong2;
   FixedText<12> TenDinhHuong2;
   std::string StXDinhHuong2, StYDinhHuong2, StSaiGoc;
   double pvd = 0, cdhdau = 0, dscdh = 0.05;
@@ -114,33 +110,26 @@ struct ComputationFields {
   // Coordinate and distance texts are padded to their widths, never cut.
   FixedNumber<11> StX;
   FixedNumber<10> StY, StZ;
-  FixedNumber<8> StS, StCanh;
+  FixedNumber<8> StS;
 
   // Tables of the run.
   std::vector<KnownPoint> MangKhongChe;
-  std::vector<std::string> MangSoLieuASC;
-  std::vector<std::string> MangSoLieuToaDo;
   std::vector<SketchRow> MangSoLieuSoDo;
-  std::vector<PegEntry> MangCocPhu;
-  std::string ChuoiKC;
 
   // Lookup indexes of the tables above by trimmed name, brought up to date
   // when a point is looked up: positions in MangKhongChe and
-  // survey.points, the names of the lines of ChuoiKC, the names of
+  // survey.points, the names in survey.controlListing, the names of
   // survey.control.
   struct NameIndex {
     std::unordered_map<std::string, std::vector<std::size_t>> positions;
     std::size_t done = 0;
   };
   NameIndex knownIndex, detailIndex;
-  std::unordered_set<std::string> chuoiKCNames;
-  std::size_t chuoiKCRead = 0;
+  std::unordered_set<std::string> listedNames;
   std::unordered_set<std::string> controlNames;
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
-  int sdasc() const { return static_cast<int>(MangSoLieuASC.size()); }
   int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
-  int sdcp() const { return static_cast<int>(MangCocPhu.size()); }
 
   // The working copy of the field book (without its control-point records),
   // held in memory so that runs never share a file.

@@ -100,14 +100,11 @@ void Orient(RunState& st, const std::string& otherName) {
                     otherName + std::string(msg::kWrongCoordinates),
                 st.TenTram.str());
   }
-  st.StCanh = Mask(RoundEven(st.cdh, 3), "####.000");
-  const std::string trimmed = Trim(st.StCanh.str());
-  if (trimmed.size() < 8) st.StCanh = std::string(8 - trimmed.size(), ' ') + trimmed;
 }
 
 // A computed detail point or peg, as the products write its coordinates.
 void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string code,
-               std::string note) {
+               std::string note, bool listed) {
   ComputedPoint point;
   point.name = Trim(name);
   point.x = st.xi;
@@ -119,6 +116,9 @@ void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string 
   point.kind = kind;
   point.station = st.survey.stations.size() - 1;
   point.line = st.line;
+  point.prism = st.ccg;
+  point.record = st.dong;
+  point.listed = listed;
   st.survey.points.push_back(std::move(point));
 }
 
@@ -201,7 +201,6 @@ void ReportLongName(RunState& st, std::string_view name) {
 void STP5(RunState& st) {
   ReportLongName(st, st.Field(0));
   if (!ObservationUsable(st)) return;
-  st.MangSoLieuASC.push_back(st.dong);
   if (st.dctdau == 1) {
     st.DiemDau = st.TenDiem.str();
     st.DiemCuoi = st.TenDiem.str();
@@ -216,8 +215,9 @@ void STP5(RunState& st) {
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
   auto [code, note] = CodeAndNote(st);
-  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note));
-  GhiMangSoLieuToaDo(st);
+  // Descriptive words are the code; a record without them is listed too.
+  const bool listed = st.stp == 5 || !code.empty();
+  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note), listed);
   GhiMangSoLieuVaoSoDo(st);
 }
 
@@ -239,7 +239,6 @@ void STP6(RunState& st) {
   }
   ReportLongName(st, st.Field(5));
   if (!ObservationUsable(st)) return;
-  st.MangSoLieuASC.push_back(st.dong);
   st.s = Val(st.Field(2));
   st.goc = Val(st.Field(3));
   st.ccg = Val(st.Field(4));
@@ -247,21 +246,21 @@ void STP6(RunState& st) {
   st.goc = Val(st.Field(1));
   TinhToaDo(st);
   NotePoint(st, PointKind::Peg, st.TenKC.str(), std::string(),
-            st.stp > 6 ? st.Field(6) : std::string());
-  // The peg becomes a known point for the rest of the run.
+            st.stp > 6 ? st.Field(6) : std::string(), false);
+  // The peg becomes a known point for the rest of the run, listed with its
+  // height and note.
   st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
-  std::string line = ControlLine(st.TenKC, st.StX, st.StY, &st.StZ.str());
-  if (st.stp > 6) line += " " + st.Field(6);
-  st.ChuoiKC += line + "\r\n";
-  st.MangCocPhu.push_back({"", st.Field(5), st.Field(1), st.Field(2), st.Field(3), st.Field(4),
-                           st.stp > 6 ? st.Field(6) : std::string()});
+  const std::string name = Trim(st.TenKC.str());
+  st.listedNames.insert(name);
+  st.survey.controlListing.push_back({name, st.survey.points.size() - 1, {}, {}, {}, true});
 }
 
 void STP7(RunState& st) {
   if (NumbersMissing(st, {1, 2})) return;
   st.TenKC = st.Field(5);
   st.TenDinhHuong2 = st.TenKC.str();
-  st.DongDinhHuong2 = "DKD2 " + st.TenKC.str();
+  std::string& checkRecord = st.survey.stations.back().checkRecord;
+  checkRecord = "DKD2 " + st.TenKC.str();
   // The record's own distance is the one checked.
   st.s = Val(st.Field(2));
   st.goc = Val(st.Field(1));
@@ -293,9 +292,9 @@ void STP7(RunState& st) {
     st.StSaiGoc.clear();
     st.StXDinhHuong2.clear();
     st.StYDinhHuong2.clear();
-    st.DongDinhHuong2 += " " + st.Field(1);
+    checkRecord += " " + st.Field(1);
   } else if (Val(Trim(st.Field(1))) != 0) {
-    st.DongDinhHuong2 += " " + st.Field(1);
+    checkRecord += " " + st.Field(1);
   } else {
     // No reading was recorded: make one from the computed angle, within half
     // a minute of it.
@@ -311,9 +310,9 @@ void STP7(RunState& st) {
     }
     GocString(st);
     st.StGoc = Trim(Mask(Val(st.StGoc), "#######"));
-    st.DongDinhHuong2 += " " + st.StGoc;
+    checkRecord += " " + st.StGoc;
   }
-  st.DongDinhHuong2 += " " + st.Field(2);
+  checkRecord += " " + st.Field(2);
 }
 
 }  // namespace kavu

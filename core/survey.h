@@ -28,6 +28,12 @@ struct StationResult {
   std::optional<SurveyPoint> check;     // the check point of a check record
   std::optional<double> checkResidual;  // check sight minus computed angle, degrees
   std::size_t line = 0;                 // field-book line of the station record (from 1)
+  std::string instrumentHeight = {};    // the station record's instrument height, as it stands
+  double backBearing = 0;               // azimuth orientation -> station, degrees, as computed
+  // The station's last check record as the peg file repeats it: "DKD2", the
+  // check point, the reading (made up from the computed angle when none was
+  // recorded), the distance; empty without one.
+  std::string checkRecord = {};
 };
 
 enum class PointKind { Detail, Peg };
@@ -42,6 +48,21 @@ struct ComputedPoint {
   std::size_t station = 0;  // index into Survey::stations
   std::size_t line = 0;     // field-book line of its record (from 1)
   double z = 0;             // the height as computed, unrounded (also with heights off)
+  double prism = 0;         // the prism height of its record
+  std::string record = {};  // its record line, fields set off by single spaces
+  // Whether the coordinate listing (.td1) gives it a line: a detail point
+  // whose record has no words after the prism height, or descriptive words.
+  bool listed = false;
+};
+
+// A line of the control-point listing that heads the .kc, the TRIDO book and
+// the .td1: a known point looked up by the run, or a point of this run (a peg,
+// or a detail point looked up as "DKC" + its name).
+struct ControlListing {
+  std::string name;                  // the name as looked up, trimmed
+  std::optional<std::size_t> point;  // index into Survey::points for a point of this run
+  std::string x, y, z;               // a known point's coordinates as their texts stand
+  bool height = false;               // whether the line gives the height
 };
 
 // One message of the error report, in run order.
@@ -55,10 +76,11 @@ struct ReportEntry {
 };
 
 struct Survey {
-  std::vector<SurveyPoint> control;     // the known points the run used, in first-use order
-  std::vector<StationResult> stations;  // in field-book order
-  std::vector<ComputedPoint> points;    // detail points and pegs, in field-book order
-  std::vector<ReportEntry> report;      // error-report messages, in run order
+  std::vector<SurveyPoint> control;            // the known points the run used, in first-use order
+  std::vector<StationResult> stations;         // in field-book order
+  std::vector<ComputedPoint> points;           // detail points and pegs, in field-book order
+  std::vector<ReportEntry> report;             // error-report messages, in run order
+  std::vector<ControlListing> controlListing;  // in run order
 };
 
 }  // namespace kavu

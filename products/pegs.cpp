@@ -1,6 +1,9 @@
 #include "products/pegs.h"
 
+#include <optional>
 #include <string>
+#include <string_view>
+#include <vector>
 
 #include "core/messages.h"
 #include "core/text.h"
@@ -15,6 +18,8 @@ constexpr std::size_t kLongestReading = 7;
 // runs into the one before it, so the line can still be read back as a field
 // book.
 constexpr int kColumn = 8;
+
+bool ReadingTooLong(std::string_view reading) { return Trim(reading).size() > kLongestReading; }
 
 }  // namespace
 
@@ -31,27 +36,44 @@ void WritePegFileHead(RunState& st) {
   }
 }
 
-void incocphu(RunState& st) {
-  if (!Ticked(st.fcp) || st.MangCocPhu.empty()) return;
-
-  TextOut& out = st.cpFile;
-  out.Line("TR " + st.TenTram.str());
-  out.Line("DKD1 " + st.TenDinhHuong.str());
-  if (!st.DongDinhHuong2.empty()) out.Line(st.DongDinhHuong2);
-
-  for (const PegEntry& peg : st.MangCocPhu) {
-    st.TenDiem = peg[1];
-    const std::string reading = Trim(peg[2]);
-    if (reading.size() > kLongestReading) {
-      // An impossible reading ends the station's block; the lines already
-      // written stay.
-      ReportError(st, "Diem " + st.TenDiem.str() + std::string(msg::kWrongDegrees),
-                  st.TenDiem.str());
+void CheckPegReadings(RunState& st, std::size_t firstPoint) {
+  if (!Ticked(st.fcp)) return;
+  for (std::size_t i = firstPoint; i < st.survey.points.size(); ++i) {
+    const ComputedPoint& point = st.survey.points[i];
+    if (point.kind != PointKind::Peg) continue;
+    std::string record = point.record;
+    const std::vector<std::string> fields = SplitFields(record);
+    if (ReadingTooLong(fields[1])) {
+      const std::string name = FixedWidth(fields[5], 12);
+      ReportError(st, "Diem " + name + std::string(msg::kWrongDegrees), name);
       return;
     }
-    out.Line(Trim(peg[0]) + " " + st.TenDiem.str() + RString(reading, kColumn) +
-             NumberColumn(peg[3], kColumn) + NumberColumn(peg[4], kColumn) + " " + Trim(peg[5]) +
-             " " + Trim(peg[6]));
+  }
+}
+
+void WritePegBlocks(TextOut& out, const Survey& survey) {
+  std::optional<std::size_t> station;
+  bool ended = false;
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind != PointKind::Peg) continue;
+    if (point.station != station) {
+      station = point.station;
+      ended = false;
+      const StationResult& s = survey.stations[point.station];
+      out.Line("TR " + FixedWidth(s.station.name, 12));
+      out.Line("DKD1 " + FixedWidth(s.orientation.name, 12));
+      if (!s.checkRecord.empty()) out.Line(s.checkRecord);
+    }
+    if (ended) continue;
+    // The record's fields: point, reading, distance, zenith, prism height,
+    // peg name and the note.
+    std::string record = point.record;
+    const std::vector<std::string> f = SplitFields(record);
+    ended = ReadingTooLong(f[1]);
+    if (ended) continue;
+    out.Line(" " + FixedWidth(f[5], 12) + RString(Trim(f[1]), kColumn) +
+             NumberColumn(f[2], kColumn) + NumberColumn(f[3], kColumn) + " " + Trim(f[4]) + " " +
+             (f.size() > 6 ? Trim(f[6]) : std::string()));
   }
 }
 

@@ -9,7 +9,14 @@ namespace kavu {
 // The control-point lines at the head of the file, when fcp is ticked.
 void WritePegFileHead(RunState& st);
 
-// The current station's peg block, when fcp is ticked and it has pegs.
-void incocphu(RunState& st);
+// Reports the first peg of the station just computed (its points from
+// firstPoint on) whose reading cannot be a DDDMMSS reading: it ends the
+// station's block in the peg file. Only when fcp is ticked.
+void CheckPegReadings(RunState& st, std::size_t firstPoint);
+
+// A block in field-book form for each station that set out pegs: the station,
+// its orientation, its check record, then each peg up to one with a reading
+// that cannot be one.
+void WritePegBlocks(TextOut& out, const Survey& survey);
 
 }  // namespace kavu

@@ -2,11 +2,15 @@
 
 #include <algorithm>
 #include <filesystem>
+#include <optional>
 #include <string>
 
+#include "core/angles.h"
+#include "core/lookup.h"
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/paths.h"
+#include "core/results.h"
 #include "core/station.h"
 #include "core/text.h"
 
@@ -25,11 +29,60 @@ void WriteStationListingHeader(TextOut& out) {
   for (std::string_view line : msg::kCpvHeader) out.Line(line);
 }
 
+std::string OrientationDistanceText(double distance) {
+  return NumberWidth(RString(Mask(distance, "####.000"), 8), 8);
+}
+
+void WriteStationListing(TextOut& out, const Survey& survey) {
+  // The first and last detail point of each station.
+  struct Ends {
+    std::string_view first, last;
+    bool any = false;
+  };
+  std::vector<Ends> ends(survey.stations.size());
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind != PointKind::Detail) continue;
+    Ends& e = ends[point.station];
+    if (!e.any) e.first = point.name;
+    e.last = point.name;
+    e.any = true;
+  }
+  for (std::size_t i = 0; i < survey.stations.size(); ++i) {
+    const StationResult& s = survey.stations[i];
+    out.Line(FixedWidth(s.station.name, 12) + FixedWidth(s.orientation.name, 12) + " " +
+             GocStringText(s.backBearing) + " " + OrientationDistanceText(s.orientationDistance) +
+             "    " + FixedWidth(ends[i].first, 5) + " -  " + FixedWidth(ends[i].last, 5));
+  }
+}
+
 std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {
   const std::string height =
       NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
   return FixedWidth(p.name, 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
          NumberWidth(EastingText(p.y), 10) + " " + height + " " + p.code + " " + p.note;
+}
+
+std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
+  if (!entry.point) {
+    return ControlLine(FixedWidth(entry.name, 12), entry.x, entry.y,
+                       entry.height ? &entry.z : nullptr);
+  }
+  const ComputedPoint& point = survey.points[*entry.point];
+  const std::string z = NumberWidth(HeightText(point.z), 10);
+  std::string line =
+      ControlLine(FixedWidth(entry.name, 12), NumberWidth(NorthingText(point.x), 11),
+                  NumberWidth(EastingText(point.y), 10), entry.height ? &z : nullptr);
+  if (point.kind == PointKind::Peg && !point.note.empty()) line += " " + point.note;
+  return line;
+}
+
+std::string CoordinateListingLine(const ComputedPoint& p) {
+  std::string line = LString(p.name, 5) + NumberColumn(NorthingText(p.x), 12) +
+                     NumberColumn(EastingText(p.y), 12) + NumberColumn(HeightText(p.z), 12) +
+                     NumberColumn(PrismText(p.prism), 10);
+  if (!p.code.empty()) line += " " + p.code;
+  if (!p.note.empty()) line += " " + p.note;
+  return line;
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {
@@ -55,6 +108,33 @@ void WriteProduct(RunState& st, const std::string& path, Body body) {
   if (!out.commit()) st.unwritable.push_back(path);
 }
 
+// The control-point listing, ended by an empty line.
+void WriteControlListing(TextOut& out, const Survey& survey) {
+  for (const ControlListing& entry : survey.controlListing) {
+    out.Line(ControlListingLine(survey, entry));
+  }
+  out.Line("");
+}
+
+// The records of each computed station under its station and orientation
+// lines: as they were read (the TRIDO book), or as their coordinates (.td1).
+void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
+  std::optional<std::size_t> station;
+  for (const ComputedPoint& point : survey.points) {
+    if (point.station != station) {
+      station = point.station;
+      const StationResult& s = survey.stations[point.station];
+      out.Line("TR " + FixedWidth(s.station.name, 12) + " " + s.instrumentHeight);
+      out.Line("DKD " + FixedWidth(s.orientation.name, 12));
+    }
+    if (!coordinates) {
+      out.Line(point.record);
+    } else if (point.listed) {
+      out.Line(CoordinateListingLine(point));
+    }
+  }
+}
+
 int HeightDecimals(const std::string& text) {
   const double d = RoundEvenWhole(Val(text));
   return static_cast<int>(std::clamp(d, 0.0, 10.0));
@@ -64,21 +144,18 @@ int HeightDecimals(const std::string& text) {
 
 void WriteTextProducts(RunState& st) {
   if (Ticked(st.fkc)) {
-    WriteProduct(st, st.daufile + ".kc", [&](TextOut& out) { out.Line(st.ChuoiKC); });
+    WriteProduct(st, st.daufile + ".kc",
+                 [&](TextOut& out) { WriteControlListing(out, st.survey); });
   }
   if (Ticked(st.fasc)) {
     std::error_code ignored;
     std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
-    WriteProduct(st, st.filesl1, [&](TextOut& out) {
-      out.Line(st.ChuoiKC);
-      for (const std::string& line : st.MangSoLieuASC) out.Line(line);
-    });
-    WriteProduct(st, st.daufile + ".td1", [&](TextOut& out) {
-      out.Line(st.ChuoiKC);
-      for (const std::string& line : st.MangSoLieuToaDo) {
-        if (!Trim(line).empty()) out.Line(line);
-      }
-    });
+    for (const bool coordinates : {false, true}) {
+      WriteProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1, [&](TextOut& out) {
+        WriteControlListing(out, st.survey);
+        WriteStationRecords(out, st.survey, coordinates);
+      });
+    }
   }
   if (Ticked(st.ftd)) {
     const int decimals = HeightDecimals(st.txtSoleDC);

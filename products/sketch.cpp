@@ -7,6 +7,7 @@
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
+#include "products/reports.h"
 
 namespace kavu {
 
@@ -42,13 +43,6 @@ std::string DetailRow(const SketchRow& row) {
   return "|" + LString(Trim(row[0]), 5) + " |" + RString(Trim(row[2]), 9) + " |  " + row[1] +
          "  |  " + NumberWidth(row[3], 11) + "| " + NumberWidth(row[4], 10) + "  | " +
          FixedWidth(row[5], 12) + " |";
-}
-
-// The station's orientation distance in the form of StCanh. StCanh itself
-// may hold the distance to a check record's point by the time the station
-// ends; the closing row is the orientation's.
-std::string OrientationDistance(const RunState& st) {
-  return NumberWidth(RString(Mask(st.cdhdau, "####.000"), 8), 8);
 }
 
 }  // namespace
@@ -87,8 +81,8 @@ void insodo(RunState& st) {
   for (const SketchRow& row : st.MangSoLieuSoDo) out.Line(DetailRow(row));
 
   // The closing row: orientation distance, reading and the orientation point.
-  out.Line("|      | " + OrientationDistance(st) + " | " + reading + " | " + "            |  " +
-           "           | " + st.TenDinhHuong.str() + " |");
+  out.Line("|      | " + OrientationDistanceText(st.cdhdau) + " | " + reading + " | " +
+           "            |  " + "           | " + st.TenDinhHuong.str() + " |");
   out.Line(std::string(kFormWidth, '='));
 }
 

@@ -64,13 +64,6 @@ class WorkingCopy {
   std::size_t next_ = 0;
 };
 
-// The lengths of the two lists of the regenerated field book stay equal to
-// the count of its lines.
-void DropStationEntries(RunState& st, std::size_t keep) {
-  st.MangSoLieuASC.resize(keep);
-  if (st.MangSoLieuToaDo.size() > keep) st.MangSoLieuToaDo.resize(keep);
-}
-
 void HandleBodyRecord(RunState& st) {
   const std::size_t stp = st.MangTruong.size();
   auto codeIsPegName = [&] {
@@ -123,23 +116,15 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   station.bearing = st.gpv >= 180 ? st.gpv - 180 : st.gpv + 180;
   station.orientationDistance = st.cdhdau;
   station.line = recordLine;
+  station.instrumentHeight = st.ccm;
+  station.backBearing = st.gpv;
   st.survey.stations.push_back(std::move(station));
-  st.DongTram += " " + st.StGoc + " " + st.StCanh.str();
   if (Ticked(st.fsdo)) {
     st.TenDinhHuong2 = "";
     st.StXDinhHuong2.clear();
     st.StYDinhHuong2.clear();
     st.StSaiGoc.clear();
   }
-  const std::string stationLine = "TR " + st.TenTram.str() + " " + st.ccm;
-  const std::string orientationLine = "DKD " + st.TenDinhHuong.str();
-  st.MangSoLieuToaDo.resize(st.MangSoLieuASC.size());
-  for (const std::string& line : {stationLine, orientationLine}) {
-    st.MangSoLieuASC.push_back(line);
-    st.MangSoLieuToaDo.push_back(line);
-  }
-  const std::size_t bodyStart = st.MangSoLieuASC.size();
-
   // An orientation record on the last line leaves the station without a body.
   const bool hasBody = !copy.AtEnd();
   copy.ReadLine();
@@ -147,7 +132,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   st.DiemDau = "";
   st.DiemCuoi = "";
   st.dctdau = 1;
-  st.DongDinhHuong2.clear();
+  const std::size_t firstPoint = st.survey.points.size();
   while (hasBody && Trim(st.TenDiem.str()) != "TR") {
     ++counters.bodyRecords;
     HandleBodyRecord(st);
@@ -155,10 +140,8 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     copy.ReadLine();
     st.TenDiem = st.Field(0);
   }
-  if (st.MangSoLieuASC.size() == bodyStart) DropStationEntries(st, bodyStart - 2);
-  st.cpvFile.Line(st.DongTram + "    " + st.DiemDau.str() + " -  " + st.DiemCuoi.str());
   insodo(st);
-  incocphu(st);
+  CheckPegReadings(st, firstPoint);
 }
 
 void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
@@ -203,12 +186,10 @@ void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& te
 void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
   st.MangSoLieuSoDo.clear();
-  st.MangCocPhu.clear();
   if (st.Field(0).starts_with("TR") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
     st.ccm = st.Field(2);
-    st.DongTram = st.TenKC.str();
     // A height that is no number is as good as none: computed with 0.
     if (!HasNumber(st.ccm)) {
       ReportError(st,
@@ -229,7 +210,6 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   if (st.Field(0).starts_with("DKD") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
-    st.DongTram += st.TenKC.str();
     TimToaDoDiem(st);
     st.TenDinhHuong = st.TenKC.str();
     TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
@@ -313,7 +293,8 @@ RunResult tinh_Click(RunState& st, Host& host) {
   // The working copy holds all the run reads of the field book from here on.
   fieldBook.reset();
   WritePegFileHead(st);
-  st.ChuoiKC.clear();
+  st.survey.controlListing.clear();
+  st.listedNames.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
   if (st.tamsl.empty()) {
@@ -355,6 +336,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     st.cpvFile.abandon();
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
+    WriteStationListing(st.cpvFile, st.survey);
     CommitKeptFile(st, st.cpvFile);
     WriteErrorReport(st.errFile, st.survey.report);
     CommitKeptFile(st, st.errFile);
@@ -363,6 +345,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.fdxf) && !ProductOverInput(st, st.daufile + ".dxf") && !indxf(st)) {
     st.unwritable.push_back(st.daufile + ".dxf");
   }
+  if (Ticked(st.fcp)) WritePegBlocks(st.cpFile, st.survey);
   CommitKeptFile(st, st.cpFile);
   CommitKeptFile(st, st.sdoFile);
   if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");

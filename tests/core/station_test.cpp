@@ -78,7 +78,7 @@ TEST(TinhPhuongViCanh, SinglePrecisionAzimuthsAndDistance) {
   f.st.xDKD = 900;
   f.st.yDKD = 1000;
   TinhPhuongViCanh(f.st);
-  EXPECT_EQ(f.st.StCanh.str(), " 100.000");
+  EXPECT_DOUBLE_EQ(f.st.cdh, 100);
   EXPECT_EQ(f.st.StGoc, "   0 00 00");
 
   f.st.TenTram = "ST";

@@ -22,19 +22,30 @@ const std::vector<KnownPoint> kControl = {
     {"\xa7\xd3i1", "2345600", "567800.5", "-1.25"},
 };
 
-PegEntry Peg(std::string name, std::string angle, std::string distance, std::string zenith,
-             std::string prism, std::string note) {
-  return {"", name, angle, distance, zenith, prism, note};
+// A peg's record: point, reading, distance, zenith, prism height, peg name,
+// note.
+std::string Peg(const std::string& name, const std::string& angle, const std::string& distance,
+                const std::string& zenith, const std::string& prism, const std::string& note) {
+  std::string record = "1 " + angle + " " + distance + " " + zenith + " " + prism + " " + name;
+  return note.empty() ? record : record + " " + note;
 }
 
-void Station(RunState& st, const std::string& tram, const std::string& ccm,
-             const std::string& dinhHuong, const std::string& dong2, std::vector<PegEntry> pegs) {
-  st.TenTram = tram;
-  st.ccm = ccm;
-  st.TenDinhHuong = dinhHuong;
-  st.DongDinhHuong2 = dong2;
-  st.MangCocPhu = std::move(pegs);
-  incocphu(st);
+void Station(RunState& st, const std::string& tram, const std::string& dinhHuong,
+             const std::string& dong2, const std::vector<std::string>& pegs) {
+  StationResult station;
+  station.station.name = tram;
+  station.orientation.name = dinhHuong;
+  station.checkRecord = dong2;
+  st.survey.stations.push_back(station);
+  const std::size_t first = st.survey.points.size();
+  for (const std::string& record : pegs) {
+    ComputedPoint point;
+    point.kind = PointKind::Peg;
+    point.station = st.survey.stations.size() - 1;
+    point.record = record;
+    st.survey.points.push_back(point);
+  }
+  CheckPegReadings(st, first);
 }
 
 // A state whose peg file is open, with the control points read.
@@ -50,7 +61,7 @@ RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
 // The head with heights, then: a station with two pegs and no check record
 // (the second with a 13-character name, a distance that fills its column and
 // a zenith longer than it: each still set off by a space); a station without
-// pegs (nothing); a check record, a peg with spaces around its texts and a
+// pegs (nothing); a check record, a peg with a
 // note, then an 8-character reading that ends the block; a check record and
 // an 8-character reading on the first peg (station lines only). Station lines
 // carry no instrument height.
@@ -61,20 +72,21 @@ TEST(Pegs, HeadAndStationBlocks) {
   WritePegFileHead(st);
   EXPECT_EQ(st.TenKC.str(), "\xa7\xd3i1        ");
   EXPECT_EQ(st.StZ.str(), "-1.25     ");
-  Station(st, "ST1", "1.45", "DH1", "",
+  Station(st, "ST1", "DH1", "",
           {Peg("M5", "1234530", "45.6", "900000", "1.5", ""),
-           Peg("CP1234567890123", "0", "1234.567", "0895959.5", "1.45", "COC GO")});
-  Station(st, "ST1", "1.45", "M5", "", {});
+           Peg("CP1234567890123", "0", "1234.567", "0895959.5", "1.45", "COCGO")});
+  Station(st, "ST1", "M5", "", {});
   EXPECT_EQ(st.err, 0);
   Station(
-      st, "M5", "", "ST1", "DKD2 KT2          1234530 100.25",
-      {Peg("M6", " 45 ", " 10.000 ", " 0900000 ", " 1.500 ", "N"),
+      st, "M5", "ST1", "DKD2 KT2          1234530 100.25",
+      {Peg("M6", "45", "10.000", "0900000", "1.500", "N"),
        Peg("M7", "12345305", "12", "900000", "1.5", ""), Peg("M8", "1", "1", "900000", "1.5", "")});
   EXPECT_EQ(st.err, 1);
-  Station(st, "M6", "1.5", "M5", "DKD2 ST1          3595958 24.41",
+  Station(st, "M6", "M5", "DKD2 ST1          3595958 24.41",
           {Peg("M9", "123453.5", "12", "900000", "1.5", "")});
   EXPECT_EQ(st.err, 2);
 
+  WritePegBlocks(st.cpFile, st.survey);
   ASSERT_TRUE(st.cpFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
   ASSERT_EQ(st.survey.report.size(), 2u);
@@ -95,7 +107,7 @@ TEST(Pegs, NothingWhenNotTicked) {
   const auto folder = FreshFolder();
   RunState st = PegState(folder, 0, 1);
   WritePegFileHead(st);
-  Station(st, "ST1", "1.45", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
+  Station(st, "ST1", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
   ASSERT_TRUE(st.cpFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), "");
   EXPECT_EQ(st.err, 0);

@@ -49,7 +49,6 @@ TEST(Sketch, StationsWithAndWithoutDetailRows) {
   st.StXDinhHuong2 = "2345600.000";
   st.StYDinhHuong2 = "567950.250";
   st.cdhdau = 100;
-  st.StCanh = " 107.703";  // left by the check record: not the orientation's
   st.MangSoLieuSoDo = {
       // A 5-field record: twelve spaces as its note.
       {"15          ", " 123 45 30", " 123.456", " 89 55 00", "     1.500", "            "},
