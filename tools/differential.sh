@@ -30,6 +30,15 @@ build_cli() {  # source folder, build folder
 
 rm -rf "$work"
 mkdir -p "$work/inputs"
+# A shallow clone may lack the earlier revision: fetch it, or say plainly that
+# the comparison could not be made.
+if ! git cat-file -e "$rev^{commit}" 2>/dev/null; then
+  git fetch --quiet --unshallow 2>/dev/null || git fetch --quiet origin "$rev" 2>/dev/null || true
+fi
+if ! git cat-file -e "$rev^{commit}" 2>/dev/null; then
+  echo "differential check not made: revision $rev is not in this clone" >&2
+  exit 0
+fi
 git worktree add --detach -f "$base_src" "$rev" >/dev/null 2>&1
 trap 'git worktree remove --force "$base_src" >/dev/null 2>&1 || true' EXIT
 build_cli "$base_src" "$work/base-build"
