@@ -78,18 +78,18 @@ TEST(ConvertIdx, DmsReadingsAndFacesAcrossZero) {
 }
 
 // Gon and feet as declared: the backsight B at 0 and P at 100 gon (90
-// degrees) on face 1, 10 ft (3.048 m) at a zenith of 100 gon; R on face 2 only
-// at 350 and 320 gon (315 and 288 degrees), reduced to 135 and 72 degrees,
-// 10 ft slope giving 2.899 m horizontal. Instrument and prism heights are in
-// feet too.
+// degrees) on face 1, 10 ft (3.048 m) at a zenith of 100 gon; R on face 2 at
+// 350 and 320 gon (315 and 288 degrees, reduced to 135 and 72), then on face 1
+// at 150 and 79.9 gon (135 and 71.91 degrees): the mean zenith 71 57 18 turns
+// the 10 ft slope into 2.898 m. Instrument and prism heights are in feet too.
 TEST(ConvertIdx, DeclaredUnitsAndFaceTwo) {
   const std::string file =
       "ANGULAR GON\nLINEAR FEET\nSTN_ID \"S\"\nINST_HT 5;\n\n\n1,\"B\",1,0,100,10,1\n"
-      "2,\"P\",1,100,100,10,1\n3,\"R\",1,350,320,10,1\n";
+      "2,\"P\",1,100,100,10,1\n3,\"R\",1,350,320,10,1\n4,\"R\",1,150,79.9,10,1\n";
   EXPECT_EQ(
       ConvertIdx(file).book,
       "TR S  1.524 \r\nDKD B\r\nB        00000    3.048   900000  .3048\r\n"
-      "P       900000    3.048   900000  .3048\r\nR      1350000    2.899   720000  .3048\r\n");
+      "P       900000    3.048   900000  .3048\r\nR      1350000    2.898   715718  .3048\r\n");
   EXPECT_EQ(ConvertIdx("ANGULAR RAD\n").report,
             std::vector<std::string>{"Khong hieu khai bao cua File: ANGULAR RAD"});
 }
