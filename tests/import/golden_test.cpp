@@ -138,6 +138,13 @@ TEST(ConvertTcm, OrientationsAndShortLines) {
   // observation with nothing after its point number.
   EXPECT_EQ(ConvertTcm("h\nS\n                         12").book,
             "TR S 0.0\r\nDKD \r\n12             0       0.0               0.0 \r\n");
+  // The header line read as none, though an observation follows it; not
+  // numbers: readings without a value become "0" (and orient), the distance
+  // and prism texts are copied.
+  EXPECT_EQ(ConvertTcm("h\n" + std::string(25, ' ') + "     9 abc defg hij klmn" +
+                       std::string(9, ' ') + "    x.yz   abc")
+                .book,
+            "DKD \r\n9              0      x.yz         0     abc \r\n");
 }
 
 }  // namespace

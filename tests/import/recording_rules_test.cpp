@@ -1,9 +1,12 @@
 // Made-up recordings, one per header declaration, each run without a control
 // file: the point P must land where an azimuth and a distance from the known
 // points put it.
+#include <algorithm>
 #include <charconv>
 #include <cmath>
 #include <string>
+#include <tuple>
+#include <utility>
 #include <vector>
 
 #include "tests/import/instrument_test_util.h"
