@@ -24,11 +24,8 @@ struct Outcome {
 inline Outcome Cli(const std::vector<std::string>& args, bool terminal = false) {
   const std::vector<std::string_view> views(args.begin(), args.end());
   std::ostringstream out, err;
-  Outcome o;
-  o.code = RunCli(views, out, err, terminal);
-  o.out = out.str();
-  o.err = err.str();
-  return o;
+  const int code = RunCli(views, out, err, terminal);
+  return {code, out.str(), err.str()};
 }
 
 inline std::string Quote(const std::string& s) {
@@ -43,14 +40,11 @@ inline Outcome Exe(const std::vector<std::string>& args, const std::filesystem::
                    const std::string& shell = "") {
   std::string command = shell + "exec " + Quote(KAVU_CLI_EXE);
   for (const std::string& a : args) command += " " + Quote(a);
-  command += " <" + Quote("/dev/null") + " >" + Quote((dir / "stdout").string()) + " 2>" +
-             Quote((dir / "stderr").string());
+  command +=
+      " </dev/null >" + Quote((dir / "stdout").string()) + " 2>" + Quote((dir / "stderr").string());
   const int status = std::system(command.c_str());
-  Outcome o;
-  o.code = WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-  o.out = FileBytes(dir / "stdout");
-  o.err = FileBytes(dir / "stderr");
-  return o;
+  return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, FileBytes(dir / "stdout"),
+          FileBytes(dir / "stderr")};
 }
 
 }  // namespace kavu::testing

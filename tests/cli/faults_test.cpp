@@ -11,6 +11,7 @@
 #include <functional>
 #include <map>
 #include <memory>
+#include <regex>
 #include <set>
 #include <string>
 #include <vector>
@@ -18,27 +19,27 @@
 #include "cli/cli.h"
 #include "core/lines.h"
 #include "core/messages.h"
+#include "core/text.h"
 #include "tests/cli/cli_support.h"
+#include "tests/generated_book.h"
 #include "tests/support.h"
 
 namespace kavu {
 namespace {
 
 namespace fs = std::filesystem;
-using testing::Cli;
-using testing::Exe;
 using testing::FileBytes;
-using testing::FreshFolder;
-using testing::Outcome;
 using testing::WriteBytes;
 
 // The example job: root/data/job1.asc, its products beside it and the
-// regenerated field book in root/TRIDO.
+// regenerated field book in root/TRIDO. "@PATH" in a row's texts is PATH in
+// the job's folder.
 struct Job {
-  fs::path root, data;
-  std::string book;
+  fs::path root;
   std::unique_ptr<FileLock> held;  // another run's lock on the job
-  std::string In(const std::string& name) const { return (data / name).string(); }
+  std::string In(const std::string& text) const {
+    return std::regex_replace(text, std::regex("@([^ ]+)"), (root / "$1").string());
+  }
 };
 
 // Every file under root by its relative path: the bytes of a regular file,
@@ -48,238 +49,162 @@ std::map<std::string, std::string> Files(const fs::path& root) {
   for (const auto& entry : fs::recursive_directory_iterator(root)) {
     const std::string name = entry.path().lexically_relative(root).string();
     const fs::file_status status = entry.symlink_status();
-    if (fs::is_symlink(status)) {
-      files[name] = "link to " + fs::read_symlink(entry.path()).string();
-    } else if (fs::is_regular_file(status)) {
-      files[name] = FileBytes(entry.path());
-    } else if (!fs::is_directory(status)) {
-      files[name] = "<special>";
-    }
+    if (fs::is_directory(status)) continue;
+    files[name] = fs::is_symlink(status) ? "link to " + fs::read_symlink(entry.path()).string()
+                  : fs::is_regular_file(status) ? FileBytes(entry.path())
+                                                : "<special>";
   }
   return files;
 }
 
-// What the row runs, and the texts the run must show (on stderr or stdout).
-struct Call {
-  std::vector<std::string> args;
-  std::vector<std::string> messages;
-};
-
 struct Row {
-  std::string what;
-  std::function<Call(Job&)> prepare;  // makes the fault in the job's folder
+  const char* what;
+  std::string args;  // split at blanks
   int code;
-  std::vector<std::string> changed = {};  // files that may change, from the root
-  std::string shell = "";                 // runs the executable after this set-up
-  std::function<void(const Job&)> check = nullptr;
+  std::vector<std::string> shown = {};          // on stderr or stdout
+  std::function<void(Job&)> prepare = nullptr;  // makes the fault in the job's folder
+  std::set<std::string> changed = {};           // files that may change, from the root
+  std::string shell = "";                       // runs the executable after this set-up
 };
 
-std::string Message(std::string_view text, const std::string& path) {
-  return std::string(text) + path;
-}
-
-std::string OverInput(const std::string& path) {
-  return std::string(msg::kCannotWrite) + path + std::string(msg::kProductIsInput);
-}
-
-// A file that is no data file, given in place of a file the run reads.
-Call NotData(Job& j, const std::string& name, bool fifo, std::vector<std::string> args) {
-  const std::string path = j.In(name);
-  if (fifo) {
-    EXPECT_EQ(mkfifo(path.c_str(), 0600), 0);
-  } else {
-    fs::create_directory(path);
-  }
-  args.push_back(path);
-  if (args.size() == 3) args.push_back(j.book);
-  return {args, {Message(msg::kNotDataFile, path)}};
+std::string S(std::string_view text) { return std::string(text); }
+std::string OverInput(const char* path) {
+  return S(msg::kCannotWrite) + path + S(msg::kProductIsInput);
 }
 
 std::vector<Row> Rows() {
-  std::vector<Row> rows;
-  for (const char* kind : {"1", "2", "3", "5", "6", "7"}) {
-    rows.push_back(
-        {std::string("conversion kind ") + kind + " of the field book itself",
-         [kind](Job& j) -> Call {
-           return {{"--kind", kind, "--all", j.book}, {Message(msg::kConversionOverInput, j.book)}};
-         },
-         kExitStopped});
+  const std::string all = "--all --seed 1 @data/job1.asc";
+  const auto file = [](const char* name, std::string bytes) {
+    return [name, bytes](Job& j) { WriteBytes(j.In(name), bytes); };
+  };
+  std::vector<Row> rows = {
+      Row("conversion of the field book itself", "--kind 1 --all @data/job1.asc", kExitStopped,
+          {S(msg::kConversionOverInput) + "@data/job1.asc"}),
+      Row("field book in a folder named TRIDO", "--asc @TRIDO/job1.asc", kExitDataErrors,
+          {OverInput("@TRIDO/job1.asc")}),
+      Row("--kind 0 job1.txt --txt", "--kind 0 --txt @data/job1.txt", kExitDataErrors,
+          {OverInput("@data/job1.txt")},
+          [](Job& j) { WriteBytes(j.In("@data/job1.txt"), FileBytes(j.In("@data/job1.asc"))); }),
+      Row("--control-file a hard link of job1.cp, --pegs",
+          "--control-file @data/area.cp --pegs @data/job1.asc", kExitDataErrors,
+          {OverInput("@data/job1.cp")},
+          [](Job& j) {
+            WriteBytes(j.In("@data/job1.cp"),
+                       FileBytes(j.In("@data/job1.cp")) + "TR SPARE 1 2 3\r\n");
+            fs::create_hard_link(j.In("@data/job1.cp"), j.In("@data/area.cp"));
+          }),
+#ifdef KAVU_CLI_PICTURES
+      Row("pictures: one that cannot be written, one over the field book",
+          "--seed 1 --png @no/map.png --pdf @data/job1.asc @data/job1.asc", kExitDataErrors,
+          {S(msg::kCannotWrite) + "@no/map.png\n", OverInput("@data/job1.asc")}),
+#endif
+      Row("products that are symbolic links: replaced, not followed", all, kExitOk, {},
+          [](Job& j) {
+            for (const char* link : {"@data/job1.txt", "@data/job1.kc", "@TRIDO/job1.asc"}) {
+              const std::string target = j.In("@precious-") + fs::path(link).filename().string();
+              WriteBytes(target, "not a product\r\n");
+              fs::remove(j.In(link));
+              fs::create_symlink(target, j.In(link));
+            }
+          },
+          {"data/job1.txt", "data/job1.kc", "TRIDO/job1.asc"}),
+      // Files may not grow beyond 2 KB: the larger products cannot be written.
+      Row("disk full", all, kExitDataErrors,
+          {S(msg::kCannotWrite) + "@data/job1.txt\n", S(msg::kCannotWrite) + "@data/job1.td1\n",
+           S(msg::kCannotWrite) + "@data/job1.sdo\n", S(msg::kCannotWrite) + "@data/job1.dxf\n"},
+          nullptr, {}, "ulimit -f 4; trap '' XFSZ; "),
+      Row("the temporary files of a killed run", all, kExitOk, {},
+          [](Job& j) {
+            for (const char* name : {"@data/job1.txt.kavu-tmp", "@TRIDO/job1.asc.kavu-tmp"}) {
+              WriteBytes(j.In(name), "cut short");
+            }
+            WriteBytes(j.In("@data/job1.lock"), "");
+          },
+          {"data/job1.txt.kavu-tmp", "TRIDO/job1.asc.kavu-tmp", "data/job1.lock"}),
+      Row("two runs of one job at once", all, kExitStopped,
+          {S(msg::kBeingComputed) + "@data/job1.asc"},
+          [](Job& j) {
+            j.held = std::make_unique<FileLock>();
+            EXPECT_EQ(j.held->Acquire(j.In("@data/job1.lock")), FileLock::Result::Taken);
+          },
+          {"data/job1.lock"}),
+      // The job grown large enough that its station loop is at work when
+      // Ctrl+C comes, once the run writes its temporary files (its handler is
+      // in place by then).
+      Row("Ctrl+C", all, kExitInterrupted, {S(msg::kRunCancelled) + "\n"},
+          file("@data/job1.asc", testing::GeneratedFieldBook(400, 100)), {},
+          "(for i in $(seq 2000); do ls @data/*.kavu-tmp && break; sleep 0.005; done;"
+          " kill -INT $$) >/dev/null 2>&1 & "),
+      Row("a run stopped early: the control file is missing",
+          "--all --control-file @data/none.kc @data/job1.asc", kExitStopped,
+          {S(msg::kCannotOpen) + "@data/none.kc"}),
+      Row("--control-file a folder", "--all --control-file @data @data/job1.asc", kExitStopped,
+          {S(msg::kNotDataFile) + "@data"}),
+      Row("the field book a FIFO", "--all @data/pipe.asc", kExitStopped,
+          {S(msg::kNotDataFile) + "@data/pipe.asc"},
+          [](Job& j) { EXPECT_EQ(mkfifo(j.In("@data/pipe.asc").c_str(), 0600), 0); }),
+      Row("a missing field book", "--all @data/none.asc", kExitStopped,
+          {S(msg::kFileNotFound) + "@data/none.asc\n" + S(msg::kEnterNewFile) + "\n"}),
+      Row("an empty field book", "--all @data/empty.asc", kExitStopped,
+          {S(msg::kFileSizeZero) + "\n" + S(msg::kCheckFileAgain) + "\n"},
+          file("@data/empty.asc", "")),
+      Row("every station fails: the report and the station listing", "--all @data/lost.asc",
+          kExitDataErrors, {},
+          file("@data/lost.asc", "TR DC01 1 2 3\r\nTR X 1.5\r\nDKD Y\r\n1 0 10 0900000 1.5\r\n"),
+          {"data/lost.err", "data/lost.cpv"}),
+  };
+  for (const std::string& book : {S("TR DC01 1.45\r\n"), std::string(1 << 20, '7'),
+                                  S("TR DC01 1 2 3\r\nTR DC02 4 5 6\r\n")}) {
+    rows.push_back({"no station to compute: one line, one long line, control records only",
+                    "--all @data/odd.asc",
+                    kExitStopped,
+                    {S(msg::kNoDetailData)},
+                    file("@data/odd.asc", book)});
   }
-  rows.push_back({"field book inside a folder named TRIDO, --asc",
-                  [](Job& j) -> Call {
-                    const std::string book = (j.root / "TRIDO" / "job1.asc").string();
-                    return {{"--asc", book}, {OverInput(book)}};
-                  },
-                  kExitDataErrors});
-  // The common control file by its own name, a hard link and a ./ path.
-  rows.push_back(
-      {"--control-file job1.kc --kc",
-       [](Job& j) -> Call {
-         WriteBytes(j.In("job1.kc"), FileBytes(j.In("job1.kc")) + "TR SPARE 1 2 3\r\n");
-         return {{"--control-file", j.In("job1.kc"), "--kc", j.book}, {OverInput(j.In("job1.kc"))}};
-       },
-       kExitDataErrors});
-  rows.push_back(
-      {"--control-file a hard link of job1.kc, --kc",
-       [](Job& j) -> Call {
-         fs::create_hard_link(j.In("job1.kc"), j.data / "area.kc");
-         return {{"--control-file", j.In("area.kc"), "--kc", j.book}, {OverInput(j.In("job1.kc"))}};
-       },
-       kExitDataErrors});
-  rows.push_back({"--control-file ./job1.kc --kc",
-                  [](Job& j) -> Call {
-                    return {{"--control-file", (j.data / "." / "job1.kc").string(), "--kc", j.book},
-                            {OverInput(j.In("job1.kc"))}};
-                  },
-                  kExitDataErrors});
-  rows.push_back({"--control-file job1.cp --pegs",
-                  [](Job& j) -> Call {
-                    return {{"--control-file", j.In("job1.cp"), "--pegs", j.book},
-                            {OverInput(j.In("job1.cp")), std::string(msg::kTotalErrors) + " 0\n"}};
-                  },
-                  kExitDataErrors});
-  rows.push_back(
-      {"--kind 0 job1.txt --txt",
-       [](Job& j) -> Call {
-         WriteBytes(j.In("job1.txt"), FileBytes(j.book));
-         return {{"--kind", "0", "--txt", j.In("job1.txt")}, {OverInput(j.In("job1.txt"))}};
-       },
-       kExitDataErrors});
-  rows.push_back({"products that are symbolic links",
-                  [](Job& j) -> Call {
-                    for (const fs::path& link :
-                         {j.data / "job1.txt", j.data / "job1.kc", j.root / "TRIDO" / "job1.asc"}) {
-                      const fs::path target = j.root / ("precious-" + link.filename().string());
-                      WriteBytes(target, "not a product\r\n");
-                      fs::remove(link);
-                      fs::create_symlink(target, link);
-                    }
-                    return {{"--all", "--seed", "1", j.book}, {}};
-                  },
-                  kExitOk,
-                  {"data/job1.txt", "data/job1.kc", "TRIDO/job1.asc"},
-                  "",
-                  [](const Job& j) {
-                    EXPECT_TRUE(fs::is_regular_file(fs::symlink_status(j.data / "job1.kc")));
-                  }});
-  rows.push_back({"a run stopped early: the control file is missing",
-                  [](Job& j) -> Call {
-                    return {{"--all", "--control-file", j.In("none.kc"), j.book},
-                            {Message(msg::kCannotOpen, j.In("none.kc"))}};
-                  },
-                  kExitStopped});
-  // Files may not grow beyond 2 KB: the larger products cannot be written.
-  rows.push_back({"disk full",
-                  [](Job& j) -> Call {
-                    Call call{{"--all", "--seed", "1", j.book}, {}};
-                    for (const char* name : {"job1.txt", "job1.td1", "job1.sdo", "job1.dxf"}) {
-                      call.messages.push_back(Message(msg::kCannotWrite, j.In(name)));
-                    }
-                    return call;
-                  },
-                  kExitDataErrors,
-                  {},
-                  "ulimit -f 4; trap '' XFSZ; "});
-  rows.push_back({"the temporary files of a killed run",
-                  [](Job& j) -> Call {
-                    WriteBytes(j.In("job1.txt.kavu-tmp"), "cut short");
-                    WriteBytes(j.root / "TRIDO" / "job1.asc.kavu-tmp", "cut short");
-                    WriteBytes(j.In("job1.lock"), "");
-                    return {{"--all", "--seed", "1", j.book}, {}};
-                  },
-                  kExitOk,
-                  {"data/job1.txt.kavu-tmp", "TRIDO/job1.asc.kavu-tmp", "data/job1.lock"}});
-  rows.push_back({"two runs of one job at once",
-                  [](Job& j) -> Call {
-                    j.held = std::make_unique<FileLock>();
-                    EXPECT_EQ(j.held->Acquire(j.In("job1.lock")), FileLock::Result::Taken);
-                    return {{"--all", j.book}, {Message(msg::kBeingComputed, j.book)}};
-                  },
-                  kExitStopped,
-                  {"data/job1.lock"}});
-  rows.push_back({"--control-file a FIFO",
-                  [](Job& j) {
-                    return NotData(j, "pipe.kc", true, {"--all", "--control-file"});
-                  },
-                  kExitStopped});
-  rows.push_back({"--control-file a folder",
-                  [](Job& j) {
-                    return NotData(j, "area.kc", false, {"--all", "--control-file"});
-                  },
-                  kExitStopped});
-  rows.push_back({"--control-file /dev/zero",
-                  [](Job& j) -> Call {
-                    return {{"--all", "--control-file", "/dev/zero", j.book},
-                            {Message(msg::kNotDataFile, "/dev/zero")}};
-                  },
-                  kExitStopped});
-  rows.push_back({"the field book a FIFO",
-                  [](Job& j) { return NotData(j, "pipe.asc", true, {"--all"}); }, kExitStopped});
-  rows.push_back({"the instrument file a FIFO",
-                  [](Job& j) { return NotData(j, "pipe.sdr", true, {"--all"}); }, kExitStopped});
-  for (const auto& [what, book] : std::vector<std::pair<std::string, std::string>>{
-           {"a one-line field book", "TR DC01 1.45\r\n"},
-           {"a field book of one long line", std::string(1 << 20, '7')},
-           {"a field book of control records only", "TR DC01 1 2 3\r\nTR DC02 4 5 6\r\n"}}) {
-    rows.push_back({what,
-                    [book](Job& j) -> Call {
-                      WriteBytes(j.In("odd.asc"), book);
-                      return {{"--all", j.In("odd.asc")}, {std::string(msg::kNoDetailData)}};
-                    },
-                    kExitStopped});
-  }
-  rows.push_back({"every station fails",
-                  [](Job& j) -> Call {
-                    WriteBytes(j.In("lost.asc"),
-                               "TR DC01 1 2 3\r\nTR X 1.5\r\nDKD Y\r\n1 0 10 0900000 1.5\r\n");
-                    return {{"--all", j.In("lost.asc")}, {}};
-                  },
-                  kExitDataErrors,
-                  {},
-                  "",
-                  [](const Job& j) {
-                    EXPECT_TRUE(fs::is_regular_file(j.data / "lost.err"));
-                    EXPECT_TRUE(fs::is_regular_file(j.data / "lost.cpv"));
-                  }});
   return rows;
 }
 
 TEST(Faults, NoFileIsEverLost) {
-  const fs::path base = FreshFolder();
+  const fs::path base = testing::FreshFolder();
   int n = 0;
   for (const Row& row : Rows()) {
-    SCOPED_TRACE(row.what);
-    Job j;
-    j.root = base / std::to_string(++n) / "job";
-    j.data = j.root / "data";
-    fs::create_directories(j.data);
-    j.book = j.In("job1.asc");
-    fs::copy_file(fs::path(KAVU_EXAMPLES) / "job1.asc", j.book);
-    ASSERT_EQ(Cli({"--all", "--seed", "1", j.book}).code, kExitOk);
+    Job j{base / std::to_string(++n) / "job", nullptr};
+    SCOPED_TRACE(std::to_string(n) + ": " + row.what);
+    const auto args = [&j](const std::string& line) {
+      std::string expanded = j.In(line);
+      return SplitFields(expanded);
+    };
+    fs::create_directories(j.root / "data");
+    fs::copy_file(fs::path(KAVU_EXAMPLES) / "job1.asc", j.In("@data/job1.asc"));
+    ASSERT_EQ(testing::Cli(args("--all --seed 1 @data/job1.asc")).code, kExitOk);
 
-    const Call call = row.prepare(j);
+    if (row.prepare) row.prepare(j);
     const auto before = Files(j.root);
-    const Outcome o =
-        row.shell.empty() ? Cli(call.args) : Exe(call.args, j.root.parent_path(), row.shell);
+    const testing::Outcome o =
+        row.shell.empty() ? testing::Cli(args(row.args))
+                          : testing::Exe(args(row.args), j.root.parent_path(), j.In(row.shell));
     j.held.reset();
     const auto after = Files(j.root);
 
     EXPECT_EQ(o.code, row.code) << o.out << o.err;
-    for (const std::string& text : call.messages) {
-      EXPECT_NE((o.err + o.out).find(text), std::string::npos) << text << "\n" << o.out << o.err;
+    for (const std::string& text : row.shown) {
+      EXPECT_NE((o.err + o.out).find(j.In(text)), std::string::npos) << text << o.out << o.err;
     }
-    const std::set<std::string> changed(row.changed.begin(), row.changed.end());
+    const bool stopped = row.code == kExitStopped || row.code == kExitInterrupted;
+    EXPECT_TRUE(o.out.empty() || !stopped) << o.out;
     for (const auto& [name, bytes] : before) {
-      if (changed.contains(name)) continue;
+      if (row.changed.contains(name)) continue;
       const auto it = after.find(name);
       ASSERT_NE(it, after.end()) << name << " is gone";
       EXPECT_TRUE(it->second == bytes) << name << " changed";
     }
     for (const auto& [name, bytes] : after) {
-      EXPECT_TRUE(row.code != kExitStopped || before.contains(name)) << name << " was written";
+      EXPECT_TRUE(before.contains(name) || !stopped) << name << " was written";
       EXPECT_FALSE(name.ends_with(kTempSuffix) || name.ends_with(".lock")) << name << " is left";
     }
-    if (row.check) row.check(j);
+    for (const std::string& name : row.changed) {
+      EXPECT_TRUE(before.contains(name) || after.contains(name)) << name << " was not written";
+    }
   }
 }
 

@@ -1,7 +1,9 @@
-// The example jobs of every instrument kind through a whole run: converted by
-// the batch command, computed, and a few coordinates checked against an
-// azimuth and a reduced distance worked out here from the raw values.
+// Instrument files through a whole run: the example job of every kind,
+// converted by the batch command, computed, and a coordinate checked against
+// an azimuth and a reduced distance worked out here from the raw values; the
+// real recordings beside the tree.
 #include <cmath>
+#include <map>
 #include <string>
 #include <vector>
 
@@ -23,68 +25,117 @@ Xy Shot(Xy station, Xy orientation, double circle0, double circle, double slope,
                slope * std::sin(zenith * std::acos(-1.0) / 180));
 }
 
-struct Point {
-  const char* name;
-  Xy expected;
-};
-struct Job {
-  const char* file;
-  bool control;        // the Topcom jobs take their control points from a common file
-  std::size_t points;  // lines of the coordinate text file's names
-  std::vector<Point> checked;
-};
-
 class InstrumentRun : public InstrumentRunTest {};
+using RealRecordings = InstrumentRun;
 
 TEST_F(InstrumentRun, ExampleJobsComputeToTheirShots) {
+  struct Job {
+    const char* file;
+    bool control;        // the Topcom jobs take their control points from a common file
+    std::size_t points;  // lines of the coordinate text file's names
+    const char* name;
+    Xy expected;
+  };
   const Job jobs[] = {
-      // 101 is shot before the backsight KC02 (read at 349.315051): turned;
-      // 104 after a prism-height change; 106 from KC03 on KC01.
-      {"job-sdr.sdr",
-       false,
-       6,
-       {{"101", Shot(kKc01, kKc02, 349.315051, 15.880102, 50.0025, 89.427061)},
-        {"104", Shot(kKc01, kKc02, 349.315051, 47.039407, 100.5072, 89.258893)},
-        {"106", Shot(kKc03, kKc01, 351.119865, 272.190068, 36.0614, 91.032802)}}},
-      // The backsight shots KC02 and KC01 are points too.
-      {"job-obs.obs",
-       false,
-       8,
-       {{"101", Shot(kKc01, kKc02, 349.31505118, 15.88010235, 50.00249994, 89.42706130)},
-        {"105", Shot(kKc03, kKc01, 351.11986495, 95.36989765, 50.00022500, 89.82811318)}}},
-      // 103 twice (the second from KC02 on KC01, read at 194.56505118).
-      {"job-set.set",
-       false,
-       8,
-       {{"102", Shot(kKc01, kKc02, 349.31505118, 71.18494882, 63.24586943, 89.81881544)},
-        {"103", Shot(kKc02, kKc01, 194.56505118, 224.30993247, 72.11369079, 90.49260855)}}},
-      // 101 from GPS01 on GPS02; 113 from GPS04 on GPS03 in whole seconds.
-      {"job-idx.idx",
-       true,
-       16,
-       {{"101", Shot(kGps01, kGps02, 0, 187.633516, 84.578, 89.199928)},
-        {"113", Polar(kGps04, kGps03, Degrees(215, 57, 52), 89.659)}}},
+      // 101 is shot before the backsight KC02 (read at 349.315051): turned.
+      {"job-sdr.sdr", false, 6, "101",
+       Shot(kKc01, kKc02, 349.315051, 15.880102, 50.0025, 89.427061)},
+      // The backsight shots KC02 and KC01 are points too; 105 from KC03 on KC01.
+      {"job-obs.obs", false, 8, "105",
+       Shot(kKc03, kKc01, 351.11986495, 95.36989765, 50.00022500, 89.82811318)},
+      // 103 twice, the second from KC02 on KC01, read at 194.56505118.
+      {"job-set.set", false, 8, "103",
+       Shot(kKc02, kKc01, 194.56505118, 224.30993247, 72.11369079, 90.49260855)},
+      // 113 from GPS04 on GPS03 in whole seconds.
+      {"job-idx.idx", true, 16, "113", Polar(kGps04, kGps03, Degrees(215, 57, 52), 89.659)},
       // 205 from GPS01, circle 0 00 02 on GPS04: 293 25 37 - 2"; the peg and
       // the orientation sights are no detail points.
-      {"job-tcm.tcm",
-       true,
-       9,
-       {{"202", Polar(kGps03, kGps04, Degrees(160, 0, 37), 87.580)},
-        {"205", Polar(kGps01, kGps04, Degrees(293, 25, 35), 42.866)}}},
+      {"job-tcm.tcm", true, 9, "205", Polar(kGps01, kGps04, Degrees(293, 25, 35), 42.866)},
   };
-  tolerance_ = 0.002;  // readings through whole seconds, distances through millimetres
+  const std::filesystem::path examples = std::filesystem::path(KAVU_EXAMPLES) / "instruments";
   for (const Job& job : jobs) {
     SCOPED_TRACE(job.file);
     std::vector<std::string> args{"--txt", "--seed", "1"};
     if (job.control) {
-      args.push_back("--control-file");
-      args.push_back((kExamples / "job-idx-tcm-control.txt").string());
+      args.insert(args.end(), {"--control-file", (examples / "job-idx-tcm-control.txt").string()});
     }
-    EXPECT_EQ(Run({kExamples / job.file}, args), kExitOk);
-    const std::string txt = std::filesystem::path(job.file).stem().string() + ".txt";
-    const auto points = Coordinates(txt);
+    EXPECT_EQ(Run(examples / job.file, args), kExitOk);
+    const auto points = Coordinates(std::filesystem::path(job.file).stem().string() + ".txt");
     EXPECT_EQ(points.size(), job.points);
-    for (const Point& p : job.checked) ExpectNear(points, p.name, p.expected);
+    // Readings through whole seconds, distances through millimetres.
+    ExpectNear(points, job.name, job.expected, 0.002);
+  }
+}
+
+// The real recordings, each run on its own as a surveyor drops it onto the
+// program, without a control file: what the file says of itself is the
+// expected result. Its known points reach the field book, the points it shot
+// again agree with its own coordinates, and what cannot be computed is
+// reported.
+struct Point {
+  const char* name;
+  double x, y;  // north, east
+};
+
+TEST_F(RealRecordings, ComputeOnTheirOwn) {
+  if (!std::filesystem::is_directory(KAVU_REALDATA)) {
+    GTEST_SKIP() << "no real recordings at " << KAVU_REALDATA;
+  }
+  struct Case {
+    const char* file;
+    std::vector<Point> known;      // coordinate records as the field book must hold them
+    std::vector<Point> shot = {};  // computed points and the file's coordinates of them
+    std::vector<const char*> reported = {}, never_reported = {};
+  };
+  const Case cases[] = {
+      {"barnes-example.sdr",
+       {{"DKC0001", 0, 0}, {"DKC0003", -14.791761, -168.03557}},
+       {},
+       // The first set-up's backsight 9999 has no coordinates anywhere.
+       {"Diem: DKC9999      khong co toa do", "Cac diem mia 9999  - 1027  khong duoc tinh"},
+       // Every backsight shot with a distance fits the coordinates.
+       {"Sai canh dinh huong", "KHAC TOA DO"}},
+      // 101 and 102 shot again as 1011 and 1012 (the backsight never under
+      // its own name: the circle reading of 07KI turns the set-up).
+      {"geoeasy-focus6-1.sdr",
+       {{"101", -4.347, -6.794}, {"202", -2.422, 4.773}},
+       {{"1011", -4.347, -6.794}, {"1012", -0.172, -6.773}},
+       {},
+       {"KHAC TOA DO", "khong co toa do"}},
+      {"geoeasy-20151125.obs",
+       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
+       {},
+       {},
+       {"KHAC TOA DO", "khong co toa do"}},
+      {"geoeasy-20151130.set",
+       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
+       {},
+       {},
+       {"KHAC TOA DO", "khong co toa do"}},
+      // No observation at all: its known points only, and the run stops.
+      {"tops-sokkia_sdr33.set", {{"00000031", 509.97, 937.274}, {"00000020", 506.797, 915.514}}},
+  };
+  for (const Case& c : cases) {
+    SCOPED_TRACE(c.file);
+    Run(std::filesystem::path(KAVU_REALDATA) / c.file, {"--txt", "--asc", "--seed", "1"});
+    const std::string stem = std::filesystem::path(c.file).stem().string();
+    std::map<std::string, Xy> known;
+    for (std::string line :
+         ReadLines(dir_ / (stem + ".asc")).value_or(std::vector<std::string>())) {
+      line = Trim(line);
+      const std::vector<std::string> f = SplitFields(line);
+      if (f.size() >= 4 && f[0] == "TR") known.emplace(f[1], Xy{Val(f[2]), Val(f[3])});
+    }
+    for (const Point& p : c.known) ExpectNear(known, p.name, {p.x, p.y}, 1e-6);
+    const auto points = Coordinates(stem + ".txt");
+    for (const Point& p : c.shot) ExpectNear(points, p.name, {p.x, p.y}, 0.005);
+    const std::string report = FileBytes(dir_ / (stem + ".err"));
+    for (const char* line : c.reported) {
+      EXPECT_NE(report.find(std::string("\r\n") + line + "\r\n"), std::string::npos) << line;
+    }
+    for (const char* text : c.never_reported) {
+      EXPECT_EQ(report.find(text), std::string::npos) << text;
+    }
   }
 }
 

@@ -9,7 +9,6 @@
 #include <map>
 #include <sstream>
 #include <string>
-#include <string_view>
 #include <vector>
 
 #include "cli/cli.h"
@@ -20,25 +19,9 @@
 
 namespace kavu::testing {
 
-inline std::string DataFile(const std::string& dir, const std::string& relative) {
-  const auto bytes = ReadFileBytes(dir + "/" + relative);
-  EXPECT_TRUE(bytes.has_value()) << "missing " << dir << "/" << relative;
-  return bytes.value_or(std::string());
-}
-
 inline std::string TestData(const std::string& relative) {
-  return DataFile(KAVU_TEST_DATA "/import", relative);
+  return FileBytes(std::filesystem::path(KAVU_TEST_DATA) / "import" / relative);
 }
-inline std::string RealData(const std::string& name) { return DataFile(KAVU_REALDATA, name); }
-
-// Lines of a field book that begin with the given text.
-inline int CountStarting(std::string_view book, std::string_view prefix) {
-  int count = 0;
-  for (const std::string& line : SplitLines(book)) count += line.starts_with(prefix) ? 1 : 0;
-  return count;
-}
-
-inline int CountLines(std::string_view book) { return static_cast<int>(SplitLines(book).size()); }
 
 struct Xy {
   double x = 0, y = 0;
@@ -53,15 +36,13 @@ inline Xy Polar(Xy station, Xy orientation, double reading, double distance) {
   return {station.x + distance * std::cos(az), station.y + distance * std::sin(az)};
 }
 
-inline const std::filesystem::path kExamples = std::filesystem::path(KAVU_EXAMPLES) / "instruments";
-
-// A batch run in a folder of its own, and the coordinates it wrote.
+// Batch runs in a folder of their own, and the coordinates they wrote.
 class InstrumentRunTest : public ::testing::Test {
  protected:
-  // Copies the files into the folder and runs the batch command on the first.
-  int Run(const std::vector<std::filesystem::path>& files, std::vector<std::string> args) {
-    for (const auto& file : files) std::filesystem::copy_file(file, dir_ / file.filename());
-    args.push_back((dir_ / files.front().filename()).string());
+  // Copies the file into the folder and runs the batch command on it.
+  int Run(const std::filesystem::path& file, std::vector<std::string> args) {
+    std::filesystem::copy_file(file, dir_ / file.filename());
+    args.push_back((dir_ / file.filename()).string());
     const std::vector<std::string_view> views(args.begin(), args.end());
     std::ostringstream out, err;
     return RunCli(views, out, err, false);
@@ -78,16 +59,15 @@ class InstrumentRunTest : public ::testing::Test {
     return points;
   }
 
-  void ExpectNear(const std::map<std::string, Xy>& points, const std::string& name,
-                  Xy expected) const {
+  void ExpectNear(const std::map<std::string, Xy>& points, const std::string& name, Xy expected,
+                  double tolerance = 0.001) const {
     const auto it = points.find(name);
     ASSERT_NE(it, points.end()) << name;
-    EXPECT_NEAR(it->second.x, expected.x, tolerance_) << name;
-    EXPECT_NEAR(it->second.y, expected.y, tolerance_) << name;
+    EXPECT_NEAR(it->second.x, expected.x, tolerance) << name;
+    EXPECT_NEAR(it->second.y, expected.y, tolerance) << name;
   }
 
   const std::filesystem::path dir_ = FreshFolder("kavu-instrument");
-  double tolerance_ = 0.001;  // metres
 };
 
 }  // namespace kavu::testing

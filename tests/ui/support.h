@@ -49,12 +49,11 @@ struct Person {
   Asker::Hook hook() {
     return [this](const Question& question) {
       asked.push_back(question);
-      if (!answers.empty()) {
-        const MsgAnswer answer = answers.front();
-        answers.pop_front();
-        return answer;
-      }
-      return question.buttons == MsgButtons::Ok ? MsgAnswer::Ok : MsgAnswer::Yes;
+      if (answers.empty())
+        return question.buttons == MsgButtons::Ok ? MsgAnswer::Ok : MsgAnswer::Yes;
+      const MsgAnswer answer = answers.front();
+      answers.pop_front();
+      return answer;
     };
   }
 };
