@@ -5,6 +5,8 @@
 
 namespace kavu {
 
+// A packed angle's magnitude in decimal degrees, as gocdo decodes it.
+double PackedDegrees(double packed);
 // Decodes the packed angle in goc, checks it and the distance s, reports entry
 // errors against TenDiem.
 void gocdo(RunState& st);

@@ -34,9 +34,9 @@ std::string NumberColumn(std::string_view text, int width);
 std::string RString(std::string_view text, int width);
 std::string LString(std::string_view text, int width);
 
-// KTraCCG: trims text in place; 1 when the trimmed text holds a character
-// other than the digits and ".", otherwise 0.
-int KTraCCG(std::string& text);
+// KTraCCG: 1 when the trimmed text holds a character other than the digits
+// and ".", otherwise 0.
+int KTraCCG(std::string_view text);
 
 // A fixed-width text field of the computation state (names 12, X 11, Y 10...).
 // A name is cut to the width; a number (Cut = false) is only padded.
@@ -64,7 +64,11 @@ using FixedNumber = FixedText<N, false>;
 // normalised text written back into line; the fields returned. The caller has
 // already removed the surrounding spaces.
 std::vector<std::string> SplitFields(std::string& line);
-// The same into fields, whose strings are reused.
-void SplitFields(std::string& line, std::vector<std::string>& fields);
+// The same as views into line.
+void SplitFields(std::string& line, std::vector<std::string_view>& fields);
+
+// Field k (from 0) of a line whose fields are set off by single spaces, or the
+// empty text past its last field.
+std::string_view RecordField(std::string_view record, std::size_t k);
 
 }  // namespace kavu

@@ -93,7 +93,7 @@ bool indxf(const RunState& st) {
     if (point.kind != PointKind::Detail) continue;
     // Drawn where the coordinate text file puts it.
     const Position p = RoundedPosition(NorthingText(point.x), EastingText(point.y));
-    dxf.Label(p, h / 2, h, point.name, false);
+    dxf.Label(p, h / 2, h, st.survey.Name(point), false);
     dxf.Point("DIEM", p, false);
   }
 

@@ -16,12 +16,15 @@
 
 namespace kavu {
 
-void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report) {
+void WriteErrorReport(TextOut& out, const Survey& survey) {
   out.Line(msg::kErrHeader1);
   out.Line(msg::kErrHeader2);
-  for (const ReportEntry& entry : report) {
+  std::string line;
+  for (const ReportEntry& entry : survey.report) {
     if (entry.counted) out.Line("");
-    out.Line(entry.text);
+    line.clear();
+    survey.AppendText(line, entry);
+    out.Line(line);
   }
 }
 
@@ -43,8 +46,8 @@ void WriteStationListing(TextOut& out, const Survey& survey) {
   for (const ComputedPoint& point : survey.points) {
     if (point.kind != PointKind::Detail) continue;
     Ends& e = ends[point.station];
-    if (!e.any) e.first = point.name;
-    e.last = point.name;
+    if (!e.any) e.first = survey.Name(point);
+    e.last = survey.Name(point);
     e.any = true;
   }
   for (std::size_t i = 0; i < survey.stations.size(); ++i) {
@@ -55,11 +58,12 @@ void WriteStationListing(TextOut& out, const Survey& survey) {
   }
 }
 
-std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {
+std::string CoordinateTextLine(const Survey& survey, const ComputedPoint& p, int decimals) {
   const std::string height =
       NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
-  return FixedWidth(p.name, 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
-         NumberWidth(EastingText(p.y), 10) + " " + height + " " + p.code + " " + p.note;
+  return FixedWidth(survey.Name(p), 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
+         NumberWidth(EastingText(p.y), 10) + " " + height + " " + std::string(survey.Code(p)) +
+         " " + std::string(survey.Note(p));
 }
 
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
@@ -72,16 +76,20 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
   std::string line =
       ControlLine(FixedWidth(entry.name, 12), NumberWidth(NorthingText(point.x), 11),
                   NumberWidth(EastingText(point.y), 10), entry.height ? &z : nullptr);
-  if (point.kind == PointKind::Peg && !point.note.empty()) line += " " + point.note;
+  if (point.kind == PointKind::Peg && !survey.Note(point).empty()) {
+    line += " ";
+    line += survey.Note(point);
+  }
   return line;
 }
 
-std::string CoordinateListingLine(const ComputedPoint& p) {
-  std::string line = LString(p.name, 5) + NumberColumn(NorthingText(p.x), 12) +
+std::string CoordinateListingLine(const Survey& survey, const ComputedPoint& p) {
+  std::string line = LString(survey.Name(p), 5) + NumberColumn(NorthingText(p.x), 12) +
                      NumberColumn(EastingText(p.y), 12) + NumberColumn(HeightText(p.z), 12) +
                      NumberColumn(PrismText(p.prism), 10);
-  if (!p.code.empty()) line += " " + p.code;
-  if (!p.note.empty()) line += " " + p.note;
+  for (const std::string_view words : {survey.Code(p), survey.Note(p)}) {
+    if (!words.empty()) line.append(" ").append(words);
+  }
   return line;
 }
 
@@ -128,9 +136,9 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
       out.Line("DKD " + FixedWidth(s.orientation.name, 12));
     }
     if (!coordinates) {
-      out.Line(point.record);
+      out.Line(survey.Record(point));
     } else if (point.listed) {
-      out.Line(CoordinateListingLine(point));
+      out.Line(CoordinateListingLine(survey, point));
     }
   }
 }
@@ -161,7 +169,9 @@ void WriteTextProducts(RunState& st) {
     const int decimals = HeightDecimals(st.txtSoleDC);
     WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
       for (const ComputedPoint& point : st.survey.points) {
-        if (point.kind == PointKind::Detail) out.Line(CoordinateTextLine(point, decimals));
+        if (point.kind == PointKind::Detail) {
+          out.Line(CoordinateTextLine(st.survey, point, decimals));
+        }
       }
     });
   }

@@ -9,7 +9,7 @@ namespace kavu {
 
 // The error report (.err): its head, then each message, an error set off by
 // an empty line.
-void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report);
+void WriteErrorReport(TextOut& out, const Survey& survey);
 void WriteStationListingHeader(TextOut& out);
 // The station listing's line for each computed station: station, orientation,
 // azimuth from the orientation point, orientation distance, first and last
@@ -30,9 +30,9 @@ void WriteTextProducts(RunState& st);
 // A line of the control-point listing (.kc and the head of the TRIDO book and
 // .td1), and a detail point's line of the coordinate listing (.td1).
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry);
-std::string CoordinateListingLine(const ComputedPoint& point);
+std::string CoordinateListingLine(const Survey& survey, const ComputedPoint& point);
 
 // A line of the coordinate text file for a computed detail point.
-std::string CoordinateTextLine(const ComputedPoint& point, int decimals);
+std::string CoordinateTextLine(const Survey& survey, const ComputedPoint& point, int decimals);
 
 }  // namespace kavu

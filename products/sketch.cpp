@@ -1,9 +1,14 @@
 #include "products/sketch.h"
 
+#include <algorithm>
+#include <cmath>
+#include <span>
 #include <string>
 #include <string_view>
 
+#include "core/angles.h"
 #include "core/numbers.h"
+#include "core/results.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
@@ -39,51 +44,72 @@ std::string T(std::string_view utf8) { return Utf8ToTcvn3(utf8); }
 // One detail row: point, distance, horizontal angle, vertical angle, prism
 // height, note between the bars of columns 1, 8, 19, 34, 48, 62 and 77. A name
 // of six characters or more pushes the rest of its row to the right.
-std::string DetailRow(const SketchRow& row) {
-  return "|" + LString(Trim(row[0]), 5) + " |" + RString(Trim(row[2]), 9) + " |  " + row[1] +
-         "  |  " + NumberWidth(row[3], 11) + "| " + NumberWidth(row[4], 10) + "  | " +
-         FixedWidth(row[5], 12) + " |";
+std::string DetailRow(const Survey& survey, const ComputedPoint& point) {
+  const std::string_view record = survey.Record(point);
+  const double reading = PackedDegrees(Val(RecordField(record, 1)));
+  const double distance = RoundEven(std::fabs(Val(RecordField(record, 2))), 3);
+  const double zenith = PackedDegrees(Val(RecordField(record, 3)));
+  const std::size_t fields =
+      static_cast<std::size_t>(std::count(record.begin(), record.end(), ' ')) + 1;
+  std::string note;
+  if (fields == 5) {
+    note = std::string(12, ' ');
+  } else if (reading == 0 || point.words) {
+    note = RecordField(record, 5);
+    if (fields == 7) note.append(" ").append(RecordField(record, 6));
+  }
+  return "|" + LString(survey.Name(point), 5) + " |" + RString(Mask(distance, "#####.000"), 9) +
+         " |  " + GocStringText(reading) + "  |  " + NumberWidth(GocSt1(zenith), 11) + "| " +
+         NumberWidth(RString(PrismText(point.prism), 10), 10) + "  | " + FixedWidth(note, 12) +
+         " |";
 }
 
-}  // namespace
-
-void insodo(RunState& st) {
-  if (!Ticked(st.fsdo)) return;
-
-  // The reading on the orientation point is shown as 0 00 and a few seconds
-  // drawn at random, as the printed form has always shown it.
-  st.goc = st.rng.Next() * 0.025;
-  GocString(st);
-  const std::string reading = "    0 00 " + Mask(st.giay, "00") + " ";
-
-  const auto& nhap = st.nhap;
-  TextOut& out = st.sdoFile;
+void WriteStation(TextOut& out, const Survey& survey, const StationResult& station,
+                  std::span<const ComputedPoint> points, const std::array<std::string, 7>& nhap) {
+  const SketchTexts& t = station.sketch;
+  const std::string orientation = FixedWidth(station.orientation.name, 12);
   out.Line("");
   out.Line(T(kSketchNumber) + FixedWidth(nhap[1], 6) + std::string(kSketchTitle));
   out.Line("");
-  out.Line(T(kStation) + st.TenTram.str() + T(kArea) + FixedWidth(nhap[0], 39));
+  out.Line(T(kStation) + FixedWidth(station.station.name, 12) + T(kArea) + FixedWidth(nhap[0], 39));
   out.Line(T(kInstrument) + FixedWidth(nhap[2], 19) + T(kInstrumentNumber) +
            FixedWidth(nhap[3], 20));
   out.Line(T(kSurveyor) + FixedWidth(nhap[4], 17) + T(kRecorder) + FixedWidth(nhap[5], 18) +
            T(kDate) + FixedWidth(nhap[6], 10));
-  out.Line(T(kStationCoordinates) + NumberWidth(st.StXTram, 11) +
-           "    Y= " + NumberWidth(st.StYTram, 10) + "    Z= " + NumberWidth(st.StZTram, 10));
-  out.Line(T(kOrientation1) + st.TenDinhHuong.str() + " X= " + NumberWidth(st.StXDinhHuong, 11) +
-           "    Y= " + NumberWidth(st.StYDinhHuong, 10) +
-           "    Z= " + NumberWidth(st.StZDinhHuong, 10));
-  out.Line(T(kOrientation2) + st.TenDinhHuong2.str() + " X= " + NumberWidth(st.StXDinhHuong2, 11) +
-           "    Y= " + NumberWidth(st.StYDinhHuong2, 10));
+  out.Line(T(kStationCoordinates) + NumberWidth(t.stationX, 11) +
+           "    Y= " + NumberWidth(t.stationY, 10) + "    Z= " + NumberWidth(t.stationZ, 10));
+  out.Line(T(kOrientation1) + orientation + " X= " + NumberWidth(t.orientationX, 11) + "    Y= " +
+           NumberWidth(t.orientationY, 10) + "    Z= " + NumberWidth(t.orientationZ, 10));
+  out.Line(T(kOrientation2) + FixedWidth(t.checkName, 12) + " X= " + NumberWidth(t.checkX, 11) +
+           "    Y= " + NumberWidth(t.checkY, 10));
   out.Line(std::string(kFormWidth, '='));
   out.Line(T(kColumnHeads1));
   out.Line(T(kColumnHeads2));
   out.Line(std::string(kFormWidth, '-'));
 
-  for (const SketchRow& row : st.MangSoLieuSoDo) out.Line(DetailRow(row));
+  for (const ComputedPoint& point : points) {
+    if (point.kind == PointKind::Detail) out.Line(DetailRow(survey, point));
+  }
 
   // The closing row: orientation distance, reading and the orientation point.
-  out.Line("|      | " + OrientationDistanceText(st.cdhdau) + " | " + reading + " | " +
-           "            |  " + "           | " + st.TenDinhHuong.str() + " |");
+  const std::string reading =
+      "    0 00 " + Mask(DecomposeAngle(t.orientationReading).giay, "00") + " ";
+  out.Line("|      | " + OrientationDistanceText(station.orientationDistance) + " | " + reading +
+           " | " + "            |  " + "           | " + orientation + " |");
   out.Line(std::string(kFormWidth, '='));
+}
+
+}  // namespace
+
+void WriteSketch(TextOut& out, const Survey& survey, const std::array<std::string, 7>& header) {
+  std::size_t first = 0;
+  for (std::size_t i = 0; i < survey.stations.size(); ++i) {
+    std::size_t end = first;
+    while (end < survey.points.size() && survey.points[end].station == i) ++end;
+    WriteStation(out, survey, survey.stations[i],
+                 std::span<const ComputedPoint>(survey.points).subspan(first, end - first), header);
+    first = end;
+  }
 }
 
 }  // namespace kavu

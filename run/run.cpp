@@ -43,33 +43,53 @@ double DistanceTolerance(double scale) {
   return 2.0;
 }
 
-// The working copy, read strictly forward. Reading past its end gives an
-// empty line.
+// The working copy, read strictly forward from the field book's bytes.
+// Reading past its end gives an empty line.
 class WorkingCopy {
  public:
-  explicit WorkingCopy(RunState& st) : st_(st) {}
-  bool AtEnd() const { return next_ >= st_.tamsl.size(); }
-  long long LinesRead() const { return static_cast<long long>(next_); }
-  long long Lines() const { return static_cast<long long>(st_.tamsl.size()); }
+  explicit WorkingCopy(RunState& st) : st_(st), reader_(st.survey.book) {}
+  bool AtEnd() const { return read_ >= st_.workingLines; }
+  long long LinesRead() const { return static_cast<long long>(read_); }
+  long long Lines() const { return static_cast<long long>(st_.workingLines); }
   void ReadLine() {
-    st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
-    // Each line is read once: it leaves the working copy.
-    st_.dong = AtEnd() ? std::string() : std::move(st_.tamsl[next_++]);
-    SplitFields(st_.dong, st_.MangTruong);
+    st_.dongKept = false;
+    std::string_view raw;
+    bool found = false;
+    while (!AtEnd() && !found && reader_.Next(raw)) {
+      ++number_;
+      found = WorkingLine(raw, st_.dong, st_.MangTruong);
+    }
+    if (!found) {
+      st_.line = 0;
+      st_.dong.clear();
+      st_.MangTruong.clear();
+      st_.stp = 0;
+      read_ = st_.workingLines;
+      return;
+    }
+    ++read_;
+    st_.line = number_;
     st_.stp = static_cast<int>(st_.MangTruong.size());
+    // A line that stands in the field book as it reads is not kept again.
+    const std::string_view standing = TrimView(raw);
+    if (standing == st_.dong) {
+      st_.dongAt = static_cast<std::uint64_t>(standing.data() - st_.survey.book.data());
+      st_.dongKept = true;
+    }
   }
 
  private:
   RunState& st_;
-  std::size_t next_ = 0;
+  LineReader reader_;
+  std::size_t read_ = 0;
+  std::size_t number_ = 0;
 };
 
 void HandleBodyRecord(RunState& st) {
   const std::size_t stp = st.MangTruong.size();
   auto codeIsPegName = [&] {
-    std::string& code = st.MangTruong[5];
-    const int notDigits = KTraCCG(code);
-    return code.size() > 2 && notDigits == 1;
+    const std::string_view code = TrimView(st.MangTruong[5]);
+    return code.size() > 2 && KTraCCG(code) == 1;
   };
   if (stp == 7) {
     if (Upper(st.MangTruong[6]) == "KT") {
@@ -88,10 +108,9 @@ void HandleBodyRecord(RunState& st) {
   } else if (stp == 5) {
     STP5(st);
   }
-  const std::string name = Trim(st.TenDiem.str());
+  const std::string_view name = TrimView(st.TenDiem.str());
   if (stp < 5 && name != "TR" && name != "DKD") {
-    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether),
-                st.TenDiem.str());
+    ReportPoint(st, st.Field(0).substr(0, decltype(st.TenDiem)::kWidth), msg::kRunTogether);
   }
 }
 
@@ -118,13 +137,19 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   station.line = recordLine;
   station.instrumentHeight = st.ccm;
   station.backBearing = st.gpv;
-  st.survey.stations.push_back(std::move(station));
   if (Ticked(st.fsdo)) {
-    st.TenDinhHuong2 = "";
-    st.StXDinhHuong2.clear();
-    st.StYDinhHuong2.clear();
-    st.StSaiGoc.clear();
+    station.sketch = {st.StXTram,
+                      st.StYTram,
+                      st.StZTram,
+                      st.StXDinhHuong,
+                      st.StYDinhHuong,
+                      st.StZDinhHuong,
+                      std::string(12, ' '),
+                      {},
+                      {},
+                      0};
   }
+  st.survey.stations.push_back(std::move(station));
   // An orientation record on the last line leaves the station without a body.
   const bool hasBody = !copy.AtEnd();
   copy.ReadLine();
@@ -140,7 +165,9 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     copy.ReadLine();
     st.TenDiem = st.Field(0);
   }
-  insodo(st);
+  // The reading on the orientation point that the field sketch shows: 0 00
+  // and a few seconds drawn at random, as the printed form has always shown.
+  if (Ticked(st.fsdo)) st.survey.stations.back().sketch.orientationReading = st.rng.Next() * 0.025;
   CheckPegReadings(st, firstPoint);
 }
 
@@ -160,7 +187,7 @@ void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   const std::string line = std::string(msg::kSkippedFrom) + st.DiemDau.str() +
                            std::string(msg::kSkippedTo) + st.DiemCuoi.str() +
                            std::string(msg::kSkippedEnd);
-  st.survey.report.push_back({line, std::string(), stationLine, false});
+  st.survey.AddReport(line, {}, stationLine, false);
 }
 
 // The coordinates the lookup found, in numbers and as texts; none (and I = 0)
@@ -185,7 +212,6 @@ void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& te
 // Station and orientation records of a block; I = 0 when it cannot be computed.
 void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
-  st.MangSoLieuSoDo.clear();
   if (st.Field(0).starts_with("TR") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
@@ -202,7 +228,8 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   } else {
     st.I = 0;
     ReportError(st,
-                std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether),
+                std::string(msg::kPointColon) + std::string(st.Field(0)) +
+                    Utf8ToTcvn3(msg::kStationRunTogether),
                 st.Field(0));
   }
 
@@ -215,9 +242,10 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
   } else {
     st.I = 0;
-    ReportError(
-        st, std::string(msg::kPointColon) + st.Field(0) + std::string(msg::kOrientationRunTogether),
-        st.Field(0));
+    ReportError(st,
+                std::string(msg::kPointColon) + std::string(st.Field(0)) +
+                    std::string(msg::kOrientationRunTogether),
+                st.Field(0));
   }
 }
 
@@ -273,6 +301,9 @@ RunResult tinh_Click(RunState& st, Host& host) {
   FileLock jobLock;
   auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
+  // The survey keeps the field book's bytes: its points' records stand there.
+  st.survey.book = std::move(*fieldBook);
+  fieldBook.reset();
 
   st.Tyle = st.TyleTXT;
   st.Htext = st.Htxt;
@@ -286,18 +317,16 @@ RunResult tinh_Click(RunState& st, Host& host) {
   for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
-  if (!DocFileKhongChe(st, host, *fieldBook)) {
+  if (!DocFileKhongChe(st, host, st.survey.book)) {
     AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
-  // The working copy holds all the run reads of the field book from here on.
-  fieldBook.reset();
   WritePegFileHead(st);
   st.survey.controlListing.clear();
   st.listedNames.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
-  if (st.tamsl.empty()) {
+  if (st.workingLines == 0) {
     host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
     st.txtfile.clear();
     host.SetFileBox("");
@@ -319,9 +348,6 @@ RunResult tinh_Click(RunState& st, Host& host) {
       SkipStation(st, copy, stationLine);
     }
   }
-  // Every line of the working copy has been read.
-  st.tamsl = {};
-  st.tamslLine = {};
   // Stopped by the user: as a run that stops early, nothing is written.
   if (host.Cancelled()) {
     AbandonKeptFiles(st);
@@ -338,7 +364,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   } else {
     WriteStationListing(st.cpvFile, st.survey);
     CommitKeptFile(st, st.cpvFile);
-    WriteErrorReport(st.errFile, st.survey.report);
+    WriteErrorReport(st.errFile, st.survey);
     CommitKeptFile(st, st.errFile);
   }
   WriteTextProducts(st);
@@ -346,6 +372,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     st.unwritable.push_back(st.daufile + ".dxf");
   }
   if (Ticked(st.fcp)) WritePegBlocks(st.cpFile, st.survey);
+  if (Ticked(st.fsdo)) WriteSketch(st.sdoFile, st.survey, st.nhap);
   CommitKeptFile(st, st.cpFile);
   CommitKeptFile(st, st.sdoFile);
   if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");

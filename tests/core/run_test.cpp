@@ -86,10 +86,10 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
       reportLines.push_back(line.substr(0, line.size() - 1));
   }
   std::vector<std::string> entries;
-  for (const ReportEntry& entry : survey.report) entries.push_back(entry.text);
+  for (const ReportEntry& entry : survey.report) entries.push_back(survey.TextOf(entry));
   EXPECT_EQ(entries, reportLines);
   ASSERT_FALSE(survey.report.empty());
-  EXPECT_EQ(survey.report.front().point, "JUNK");
+  EXPECT_EQ(survey.Point(survey.report.front()), "JUNK");
   EXPECT_EQ(survey.report.front().line, 4u);
 
   std::istringstream txt(FileBytes(kEveryRecord / "expected" / "job.txt"));
@@ -101,7 +101,7 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
     std::istringstream fields(line.substr(5));
     double x = 0, y = 0;
     fields >> x >> y;
-    EXPECT_EQ(point.name.substr(0, 5), Trim(line.substr(0, 5)));
+    EXPECT_EQ(survey.Name(point).substr(0, 5), Trim(line.substr(0, 5)));
     EXPECT_EQ(point.x, x) << line;
     EXPECT_EQ(point.y, y) << line;
     EXPECT_LT(point.station, survey.stations.size());
@@ -119,7 +119,7 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_TRUE(survey.stations[0].checkResidual);
   std::vector<std::string> pegs;
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind == PointKind::Peg) pegs.push_back(point.name);
+    if (point.kind == PointKind::Peg) pegs.emplace_back(survey.Name(point));
   }
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }

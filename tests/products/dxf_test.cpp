@@ -11,12 +11,10 @@ using testing::Expected;
 using testing::FileBytes;
 using testing::FreshFolder;
 
-ComputedPoint Detail(const std::string& name, double x, double y) {
-  ComputedPoint point;
-  point.name = name;
-  point.x = x;
-  point.y = y;
-  return point;
+void AddDetail(Survey& survey, const std::string& name, double x, double y,
+               PointKind kind = PointKind::Detail) {
+  survey.AddPoint(kind == PointKind::Peg ? "1 0 1 900000 1 " + name : name + " 0 1 900000 1", kind,
+                  x, y);
 }
 
 RunState DrawingState(const std::string& tyle, const std::string& htext) {
@@ -39,11 +37,12 @@ TEST(Dxf, ControlAndDetailPointsWithTheirLabels) {
                      {"P1", "2345678.123", "567890.456", "12.5"},
                      {"ABCDEFGHIJKL", "0.5", "-0.25", ""},
                      {"BAD", "abc", "", ""}};
-  st.survey.points = {Detail("15", 2345678.123, 567890.456), Detail("", 2345700.001, 567900.999),
-                      Detail("C\xacng", -12.5, 7), Detail("ABCDEFGHIJKL", 1E3, 2E2)};
+  AddDetail(st.survey, "15", 2345678.123, 567890.456);
+  AddDetail(st.survey, "", 2345700.001, 567900.999);
+  AddDetail(st.survey, "C\xacng", -12.5, 7);
+  AddDetail(st.survey, "ABCDEFGHIJKL", 1E3, 2E2);
   // A peg is drawn among the control points, never as a detail point.
-  st.survey.points.push_back(Detail("CP", 1, 2));
-  st.survey.points.back().kind = PointKind::Peg;
+  AddDetail(st.survey, "CP", 1, 2, PointKind::Peg);
   ASSERT_TRUE(indxf(st));
   EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/control_and_detail.dxf"));
 }
@@ -57,7 +56,7 @@ TEST(Dxf, NoPointsGivesSectionAndEndOnly) {
 // A height that is not a number makes h = 0: labels of height 0 on the point.
 TEST(Dxf, HeightNotANumberPutsLabelsOnThePoint) {
   RunState st = DrawingState("500", "mm");
-  st.survey.points = {Detail("7", 100.25, 200.75)};
+  AddDetail(st.survey, "7", 100.25, 200.75);
   ASSERT_TRUE(indxf(st));
   EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf"));
 }
@@ -65,7 +64,7 @@ TEST(Dxf, HeightNotANumberPutsLabelsOnThePoint) {
 TEST(Dxf, ScaleNotANumberOrOutOfRangeGivesHeightZero) {
   for (const auto& [tyle, htext] : {std::pair{"", "2.0"}, std::pair{"1D300", "1D300"}}) {
     RunState st = DrawingState(tyle, htext);
-    st.survey.points = {Detail("7", 100.25, 200.75)};
+    AddDetail(st.survey, "7", 100.25, 200.75);
     ASSERT_TRUE(indxf(st));
     EXPECT_EQ(FileBytes(st.daufile + ".dxf"), Expected("dxf/height_not_a_number.dxf")) << tyle;
   }

@@ -39,11 +39,8 @@ void Station(RunState& st, const std::string& tram, const std::string& dinhHuong
   st.survey.stations.push_back(station);
   const std::size_t first = st.survey.points.size();
   for (const std::string& record : pegs) {
-    ComputedPoint point;
-    point.kind = PointKind::Peg;
-    point.station = st.survey.stations.size() - 1;
-    point.record = record;
-    st.survey.points.push_back(point);
+    st.survey.AddPoint(record, PointKind::Peg, 0, 0).station =
+        static_cast<std::uint32_t>(st.survey.stations.size() - 1);
   }
   CheckPegReadings(st, first);
 }
@@ -90,8 +87,8 @@ TEST(Pegs, HeadAndStationBlocks) {
   ASSERT_TRUE(st.cpFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
   ASSERT_EQ(st.survey.report.size(), 2u);
-  EXPECT_EQ(st.survey.report[0].text, "Diem M7           nhap sai phan do");
-  EXPECT_EQ(st.survey.report[1].text, "Diem M9           nhap sai phan do");
+  EXPECT_EQ(st.survey.TextOf(st.survey.report[0]), "Diem M7           nhap sai phan do");
+  EXPECT_EQ(st.survey.TextOf(st.survey.report[1]), "Diem M9           nhap sai phan do");
 }
 
 TEST(Pegs, HeadWithoutHeights) {
@@ -180,7 +177,7 @@ TEST(Pegs, PegFileIsReadBackByTheNextRun) {
   EXPECT_EQ(third.err, 1);
   ASSERT_EQ(thirdRun.survey.points.size(), 1u);
   const ComputedPoint& point = thirdRun.survey.points[0];
-  EXPECT_EQ(point.name, "CP5");
+  EXPECT_EQ(thirdRun.survey.Name(point), "CP5");
   EXPECT_EQ(NorthingText(point.x), Trim(peg[1]));
   EXPECT_EQ(EastingText(point.y), Trim(peg[2]));
   EXPECT_EQ(HeightText(point.z), "11.000");

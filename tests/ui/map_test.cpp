@@ -30,13 +30,22 @@ Survey HandMade() {
   s.control = {{"A", 1000, 2000, {}}, {"B", 1100, 2000, {}}, {"C", 1000, 2100, {}}};
   StationResult st{s.control[0], s.control[1], 0, 100, s.control[2], {}, 2};
   s.stations = {st};
-  s.points = {{"1", 1010, 2010, {}, "10", "", PointKind::Detail, 0, 4},
-              {"2", 1020, 1990, {}, "", "", PointKind::Detail, 0, 5},
-              {"CP" + Utf8ToTcvn3("đ"), 990, 2030, {}, "", "", PointKind::Peg, 0, 6},
-              {"3", 1040, 2050, {}, "", "", PointKind::Detail, 0, 7}};
-  s.report = {
-      {"Diem 2            nhap sai phan phut", "2", 5},
-      {"Diem CP" + Utf8ToTcvn3("đ") + "          nhap sai phan giay", "CP" + Utf8ToTcvn3("đ"), 6}};
+  const std::string peg = "CP" + Utf8ToTcvn3("đ");
+  const struct {
+    std::string record;
+    PointKind kind;
+    double x, y;
+  } points[] = {{"1 0 1 900000 1 10", PointKind::Detail, 1010, 2010},
+                {"2 0 1 900000 1", PointKind::Detail, 1020, 1990},
+                {"P 0 1 900000 1 " + peg, PointKind::Peg, 990, 2030},
+                {"3 0 1 900000 1", PointKind::Detail, 1040, 2050}};
+  for (const auto& p : points) {
+    ComputedPoint& point = s.AddPoint(p.record, p.kind, p.x, p.y);
+    point.line = static_cast<std::uint32_t>(s.points.size() + 3);
+    point.words = p.kind == PointKind::Detail && p.record.size() > 16;  // the code "10"
+  }
+  s.AddReport("Diem 2            nhap sai phan phut", "2", 5);
+  s.AddReport("Diem " + peg + "          nhap sai phan giay", peg, 6);
   return s;
 }
 

@@ -1,0 +1,81 @@
+#include "core/survey.h"
+
+#include <iterator>
+
+#include "core/messages.h"
+#include "core/text.h"
+
+namespace kavu {
+
+namespace {
+// A name is shown in 12 columns; a longer one whole.
+constexpr std::size_t kNameWidth = 12;
+}  // namespace
+
+std::string_view Survey::Text(std::uint64_t at, std::size_t size) const {
+  if (at < book.size()) return std::string_view(book).substr(at, size);
+  return std::string_view(made).substr(at - book.size(), size);
+}
+
+std::uint64_t Survey::Keep(std::string_view text) {
+  const std::uint64_t at = book.size() + made.size();
+  made.append(text);
+  return at;
+}
+
+std::string_view Survey::Name(const ComputedPoint& point) const {
+  return RecordField(Record(point), point.kind == PointKind::Peg ? 5 : 0).substr(0, kNameWidth);
+}
+
+std::string_view Survey::Code(const ComputedPoint& point) const {
+  return point.words ? RecordField(Record(point), 5) : std::string_view();
+}
+
+std::string_view Survey::Note(const ComputedPoint& point) const {
+  return point.words || point.kind == PointKind::Peg ? RecordField(Record(point), 6)
+                                                     : std::string_view();
+}
+
+void Survey::AppendText(std::string& out, const ReportEntry& entry) const {
+  const std::string_view name = Point(entry);
+  if (entry.message == 0) {
+    out.append(Text(entry.at + entry.size, entry.textSize));
+    return;
+  }
+  out.append(msg::kPoint);
+  out.append(name);
+  if (name.size() < kNameWidth) out.append(kNameWidth - name.size(), ' ');
+  out.append(msg::kPointMessages[entry.message - 1]);
+}
+
+std::string Survey::TextOf(const ReportEntry& entry) const {
+  std::string text;
+  AppendText(text, entry);
+  return text;
+}
+
+ComputedPoint& Survey::AddPoint(std::string_view record, PointKind kind, double x, double y) {
+  ComputedPoint point;
+  point.record = Keep(record);
+  point.recordSize = static_cast<std::uint32_t>(record.size());
+  point.kind = kind;
+  point.x = x;
+  point.y = y;
+  points.push_back(point);
+  return points.back();
+}
+
+void Survey::AddReport(std::string_view text, std::string_view point, std::size_t line,
+                       bool counted) {
+  ReportEntry entry;
+  const std::string_view name = TrimView(point);
+  entry.at = Keep(name);
+  Keep(text);
+  entry.size = static_cast<std::uint32_t>(name.size());
+  entry.textSize = static_cast<std::uint32_t>(text.size());
+  entry.line = static_cast<std::uint32_t>(line);
+  entry.counted = counted;
+  report.push_back(entry);
+}
+
+}  // namespace kavu
