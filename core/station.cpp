@@ -104,7 +104,6 @@ void NotePoint(RunState& st, PointKind kind, bool words, bool listed) {
   point.x = st.xi;
   point.y = st.yi;
   point.z = st.zi;
-  point.prism = st.ccg;
   point.record = Place(st, st.dong);
   point.recordSize = static_cast<std::uint32_t>(st.dong.size());
   point.line = static_cast<std::uint32_t>(st.line);

@@ -1,8 +1,9 @@
 #include "core/survey.h"
 
-#include <iterator>
+#include <cstring>
 
 #include "core/messages.h"
+#include "core/numbers.h"
 #include "core/text.h"
 
 namespace kavu {
@@ -11,6 +12,10 @@ namespace {
 // A name is shown in 12 columns; a longer one whole.
 constexpr std::size_t kNameWidth = 12;
 }  // namespace
+
+// A million points and their report lines fit in little memory.
+static_assert(sizeof(ComputedPoint) <= 48);
+static_assert(sizeof(ReportEntry) <= 16);
 
 std::string_view Survey::Text(std::uint64_t at, std::size_t size) const {
   if (at < book.size()) return std::string_view(book).substr(at, size);
@@ -36,10 +41,16 @@ std::string_view Survey::Note(const ComputedPoint& point) const {
                                                      : std::string_view();
 }
 
+double Survey::Prism(const ComputedPoint& point) const {
+  return Val(RecordField(Record(point), 4));
+}
+
 void Survey::AppendText(std::string& out, const ReportEntry& entry) const {
   const std::string_view name = Point(entry);
   if (entry.message == 0) {
-    out.append(Text(entry.at + entry.size, entry.textSize));
+    std::uint32_t size = 0;
+    std::memcpy(&size, Text(entry.at - sizeof size, sizeof size).data(), sizeof size);
+    out.append(Text(entry.at + entry.size, size));
     return;
   }
   out.append(msg::kPoint);
@@ -69,12 +80,15 @@ void Survey::AddReport(std::string_view text, std::string_view point, std::size_
                        bool counted) {
   ReportEntry entry;
   const std::string_view name = TrimView(point);
+  const auto size = static_cast<std::uint32_t>(text.size());
+  char sizeBytes[sizeof size];
+  std::memcpy(sizeBytes, &size, sizeof size);
+  Keep(std::string_view(sizeBytes, sizeof size));
   entry.at = Keep(name);
   Keep(text);
   entry.size = static_cast<std::uint32_t>(name.size());
-  entry.textSize = static_cast<std::uint32_t>(text.size());
   entry.line = static_cast<std::uint32_t>(line);
-  entry.counted = counted;
+  entry.counted = counted ? 1 : 0;
   report.push_back(entry);
 }
 

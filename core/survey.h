@@ -59,7 +59,6 @@ enum class PointKind : std::uint8_t { Detail, Peg };
 struct ComputedPoint {
   double x = 0, y = 0;
   double z = 0;              // the height as computed, unrounded (also with heights off)
-  double prism = 0;          // the prism height of its record
   std::uint64_t record = 0;  // where its record line stands in the survey's texts
   std::uint32_t recordSize = 0;
   std::uint32_t line = 0;     // field-book line of its record (from 1)
@@ -83,17 +82,17 @@ struct ControlListing {
   bool height = false;               // whether the line gives the height
 };
 
-// One message of the error report, in run order: a line as it stands, or
-// "Diem " + a point's name in 12 columns + one of the point messages.
+// One message of the error report, in run order: "Diem " + a point's name in
+// 12 columns + one of the point messages, or a line as it stands among the
+// made texts (its size in 4 bytes, the point it names, then the line).
 struct ReportEntry {
-  std::uint64_t at = 0;        // where its texts stand in the survey's texts
-  std::uint32_t size = 0;      // the size of the point's name there
-  std::uint32_t textSize = 0;  // a line as it stands: its size, after the name
-  std::uint32_t line = 0;      // field-book line of the record it concerns, 0 when none
-  std::uint8_t message = 0;    // 1 + the index of its point message, 0 for a line as it stands
+  std::uint64_t at : 56 = 0;      // where the point's name stands in the survey's texts
+  std::uint64_t message : 7 = 0;  // 1 + the index of its point message, 0 for a line as it stands
   // An error counted in the summary (set off by an empty line in the error
   // report); false for a line that goes with the one before it.
-  bool counted = true;
+  std::uint64_t counted : 1 = 1;
+  std::uint32_t size = 0;  // the size of the point's name
+  std::uint32_t line = 0;  // field-book line of the record it concerns, 0 when none
 };
 
 struct Survey {
@@ -116,6 +115,7 @@ struct Survey {
   std::string_view Name(const ComputedPoint& point) const;
   std::string_view Code(const ComputedPoint& point) const;
   std::string_view Note(const ComputedPoint& point) const;
+  double Prism(const ComputedPoint& point) const;  // the prism height of its record
 
   // The point a report line names (trimmed, empty when none) and the line.
   std::string_view Point(const ReportEntry& entry) const { return Text(entry.at, entry.size); }

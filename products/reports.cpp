@@ -86,7 +86,7 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
 std::string CoordinateListingLine(const Survey& survey, const ComputedPoint& p) {
   std::string line = LString(survey.Name(p), 5) + NumberColumn(NorthingText(p.x), 12) +
                      NumberColumn(EastingText(p.y), 12) + NumberColumn(HeightText(p.z), 12) +
-                     NumberColumn(PrismText(p.prism), 10);
+                     NumberColumn(PrismText(survey.Prism(p)), 10);
   for (const std::string_view words : {survey.Code(p), survey.Note(p)}) {
     if (!words.empty()) line.append(" ").append(words);
   }

@@ -60,7 +60,7 @@ std::string DetailRow(const Survey& survey, const ComputedPoint& point) {
   }
   return "|" + LString(survey.Name(point), 5) + " |" + RString(Mask(distance, "#####.000"), 9) +
          " |  " + GocStringText(reading) + "  |  " + NumberWidth(GocSt1(zenith), 11) + "| " +
-         NumberWidth(RString(PrismText(point.prism), 10), 10) + "  | " + FixedWidth(note, 12) +
+         NumberWidth(RString(PrismText(survey.Prism(point)), 10), 10) + "  | " + FixedWidth(note, 12) +
          " |";
 }
 

@@ -335,6 +335,10 @@ RunResult tinh_Click(RunState& st, Host& host) {
     return Finish(st, RunOutcome::StoppedEarly);
   }
 
+  // Room for a point and a report line a line: the vectors never move what
+  // they hold, and the room not used is never touched.
+  st.survey.points.reserve(st.workingLines);
+  st.survey.report.reserve(st.survey.report.size() + st.workingLines);
   Counters counters;
   WorkingCopy copy(st);
   copy.ReadLine();
