@@ -24,6 +24,10 @@ double RoundEvenWhole(double x);
 // |x·10^n| >= 2^52.
 double RoundEven(double x, int n);
 
+// The value of the text Mask(x, "#.000") writes (x to the millimetre, ties
+// away from zero), without the text.
+double MillimetreValue(double x);
+
 // Fix: the fraction dropped toward zero.
 double Fix(double x);
 
@@ -34,6 +38,34 @@ double Fix(double x);
 // value that is not finite gives stars as wide as the mask.
 std::string Mask(double x, std::string_view mask);
 
+// A number mask read once, for writing many numbers with it.
+struct NumberMask {
+  std::string_view text;
+  int decimals = 0;    // digits after the point
+  int wholeZeros = 0;  // "0" digits before it
+  int optional = 0;    // "#" digits at the end of the fraction
+  bool point = false;
+  double scale = 1;  // 10^decimals
+};
+constexpr NumberMask ReadMask(std::string_view text) {
+  NumberMask mask{text};
+  bool fraction = false;
+  for (const char c : text) {
+    if (c == '.') {
+      fraction = mask.point = true;
+    } else if (fraction) {
+      ++mask.decimals;
+      mask.optional = c == '#' ? mask.optional + 1 : 0;
+      mask.scale *= 10;
+    } else if (c == '0') {
+      ++mask.wholeZeros;
+    }
+  }
+  return mask;
+}
+// Mask(x, mask.text) appended to out, without a text of its own.
+void AppendMask(std::string& out, double x, const NumberMask& mask);
+
 // Ordinary number text: at most 15 significant digits, exponent form below
 // 1E-4 or from 1E+15 ("1E+15", "1E-05", "1.5E+20"), "0." shortened to ".",
 // zero is "0".
@@ -42,6 +74,9 @@ std::string NumberText(double x);
 // Number form of report lines: a space (or the minus), the number text of the
 // magnitude, one space (' 3 ', '-.12 ', ' 0 ').
 std::string ReportNumber(double x);
+// NumberText(x) and ReportNumber(x) appended to out.
+void AppendNumberText(std::string& out, double x);
+void AppendReportNumber(std::string& out, double x);
 
 // Whole number written as its decimal text with a space in the sign position
 // (the summary's counts: ' 12').

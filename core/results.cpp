@@ -1,11 +1,12 @@
 #include "core/results.h"
 
 #include "core/numbers.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
 
-std::string PrismText(double ccg) { return Mask(ccg, "####.000"); }
+std::string PrismText(double ccg) { return Mask(ccg, kPrismMask.text); }
 
 bool DescriptiveWords(const RunState& st) {
   if (st.stp < 6 || st.MangTruong.size() < 6) return false;

@@ -154,9 +154,9 @@ void GocString(RunState& st) {
   st.giay = parts.giay;
 }
 
-std::string NorthingText(double x) { return Mask(x, "#######.000"); }
-std::string EastingText(double y) { return Mask(y, "######.000"); }
-std::string HeightText(double z) { return Mask(z, "######.000"); }
+std::string NorthingText(double x) { return Mask(x, kNorthingMask.text); }
+std::string EastingText(double y) { return Mask(y, kEastingMask.text); }
+std::string HeightText(double z) { return Mask(z, kHeightMask.text); }
 
 void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
 

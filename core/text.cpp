@@ -20,15 +20,31 @@ std::string Upper(std::string_view text) {
 }
 
 std::string FixedWidth(std::string_view text, std::size_t width) {
-  std::string out(text.substr(0, width));
-  out.resize(width, ' ');
+  std::string out;
+  AppendFixed(out, text, width);
   return out;
 }
 
 std::string NumberWidth(std::string_view text, std::size_t width) {
   std::string out(text);
-  if (out.size() < width) out.resize(width, ' ');
+  PadBehind(out, 0, width);
   return out;
+}
+
+void PadBehind(std::string& out, std::size_t from, std::size_t width) {
+  const std::size_t size = out.size() - from;
+  if (size < width) out.append(width - size, ' ');
+}
+
+void PadInFront(std::string& out, std::size_t from, std::size_t width) {
+  const std::size_t size = out.size() - from;
+  if (size < width) out.insert(from, width - size, ' ');
+}
+
+void AppendFixed(std::string& out, std::string_view text, std::size_t width) {
+  const std::size_t from = out.size();
+  out.append(text.substr(0, width));
+  PadBehind(out, from, width);
 }
 
 namespace {

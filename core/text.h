@@ -29,6 +29,15 @@ std::string NumberWidth(std::string_view text, std::size_t width);
 // never runs into the value before it and the line still splits into fields.
 std::string NumberColumn(std::string_view text, int width);
 
+// The text from `from` to the end of out, padded behind (PadBehind) or in
+// front (PadInFront) to width; a longer text stays whole. For a text without
+// surrounding spaces, these are NumberWidth and RString in place; NumberColumn
+// in place is PadInFront to width - 1 after a space.
+void PadBehind(std::string& out, std::size_t from, std::size_t width);
+void PadInFront(std::string& out, std::size_t from, std::size_t width);
+// text appended cut to width and padded behind to it (FixedWidth in place).
+void AppendFixed(std::string& out, std::string_view text, std::size_t width);
+
 // RString / LString: when text is shorter than width, the trimmed text padded
 // to exactly width (spaces in front / behind); otherwise text unchanged.
 std::string RString(std::string_view text, int width);

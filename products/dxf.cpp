@@ -21,6 +21,11 @@ Position RoundedPosition(const std::string& textX, const std::string& textY) {
   return {RoundEven(Val(textX), 3), RoundEven(Val(textY), 3)};
 }
 
+// A computed point drawn where the coordinate text file puts it.
+Position RoundedPosition(const ComputedPoint& point) {
+  return {RoundEven(MillimetreValue(point.x), 3), RoundEven(MillimetreValue(point.y), 3)};
+}
+
 // The ASCII drawing file is written as pairs of lines: a group code, then its
 // value. Group 10 is the drawing's x, which carries the easting Y; group 20
 // carries the northing X. No entity carries a handle (group 5): readers give
@@ -34,13 +39,18 @@ class EntityWriter {
     out_.Line(code);
     out_.Line(value);
   }
+  void Pair(std::string_view code, double value) {
+    out_.Line(code);
+    AppendReportNumber(out_.Buffer(), value);
+    out_.EndLine();
+  }
 
   void Point(std::string_view layer, const Position& p, bool controlPoint) {
     Pair("  0", "POINT");
     Pair("  8", layer);
     if (controlPoint) Pair(" 62", "     1");
-    Pair(" 10", ReportNumber(p.y));
-    Pair(" 20", ReportNumber(p.x));
+    Pair(" 10", p.y);
+    Pair(" 20", p.x);
   }
 
   // The label sits half a label height north and east of its point.
@@ -56,10 +66,10 @@ class EntityWriter {
       Pair("  8", "DIEM_ID");
       Pair(" 62", "    3");
     }
-    Pair(" 10", ReportNumber(ly));
-    Pair(" 20", ReportNumber(lx));
+    Pair(" 10", ly);
+    Pair(" 20", lx);
     Pair(" 30", "0.0");
-    Pair(" 40", ReportNumber(height));
+    Pair(" 40", height);
     Pair("  1", name);
     Pair(" 41", "0.8");
   }
@@ -91,8 +101,7 @@ bool indxf(const RunState& st) {
   }
   for (const ComputedPoint& point : st.survey.points) {
     if (point.kind != PointKind::Detail) continue;
-    // Drawn where the coordinate text file puts it.
-    const Position p = RoundedPosition(NorthingText(point.x), EastingText(point.y));
+    const Position p = RoundedPosition(point);
     dxf.Label(p, h / 2, h, st.survey.Name(point), false);
     dxf.Point("DIEM", p, false);
   }

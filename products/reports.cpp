@@ -19,12 +19,10 @@ namespace kavu {
 void WriteErrorReport(TextOut& out, const Survey& survey) {
   out.Line(msg::kErrHeader1);
   out.Line(msg::kErrHeader2);
-  std::string line;
   for (const ReportEntry& entry : survey.report) {
-    if (entry.counted) out.Line("");
-    line.clear();
-    survey.AppendText(line, entry);
-    out.Line(line);
+    if (entry.counted) out.EndLine();
+    survey.AppendText(out.Buffer(), entry);
+    out.EndLine();
   }
 }
 
@@ -58,12 +56,37 @@ void WriteStationListing(TextOut& out, const Survey& survey) {
   }
 }
 
-std::string CoordinateTextLine(const Survey& survey, const ComputedPoint& p, int decimals) {
-  const std::string height =
-      NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
-  return FixedWidth(survey.Name(p), 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
-         NumberWidth(EastingText(p.y), 10) + " " + height + " " + std::string(survey.Code(p)) +
-         " " + std::string(survey.Note(p));
+namespace {
+
+// A number of its mask in a column of width, set off by at least one space.
+void AppendColumn(std::string& out, double x, const NumberMask& mask, std::size_t width) {
+  out.push_back(' ');
+  const std::size_t from = out.size();
+  AppendMask(out, x, mask);
+  PadInFront(out, from, width - 1);
+}
+
+}  // namespace
+
+void AppendCoordinateTextLine(std::string& out, const Survey& survey, const ComputedPoint& p,
+                              int decimals) {
+  AppendFixed(out, survey.Name(p), 5);
+  out.push_back(' ');
+  std::size_t from = out.size();
+  AppendMask(out, p.x, kNorthingMask);
+  PadBehind(out, from, 11);
+  out.push_back(' ');
+  from = out.size();
+  AppendMask(out, p.y, kEastingMask);
+  PadBehind(out, from, 10);
+  out.append("  ");
+  from = out.size();
+  AppendNumberText(out, RoundEven(MillimetreValue(p.z), decimals));
+  PadInFront(out, from, 9);
+  out.push_back(' ');
+  out.append(survey.Code(p));
+  out.push_back(' ');
+  out.append(survey.Note(p));
 }
 
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
@@ -83,14 +106,17 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
   return line;
 }
 
-std::string CoordinateListingLine(const Survey& survey, const ComputedPoint& p) {
-  std::string line = LString(survey.Name(p), 5) + NumberColumn(NorthingText(p.x), 12) +
-                     NumberColumn(EastingText(p.y), 12) + NumberColumn(HeightText(p.z), 12) +
-                     NumberColumn(PrismText(survey.Prism(p)), 10);
+void AppendCoordinateListingLine(std::string& out, const Survey& survey, const ComputedPoint& p) {
+  const std::size_t from = out.size();
+  out.append(survey.Name(p));
+  PadBehind(out, from, 5);
+  AppendColumn(out, p.x, kNorthingMask, 12);
+  AppendColumn(out, p.y, kEastingMask, 12);
+  AppendColumn(out, p.z, kHeightMask, 12);
+  AppendColumn(out, survey.Prism(p), kPrismMask, 10);
   for (const std::string_view words : {survey.Code(p), survey.Note(p)}) {
-    if (!words.empty()) line.append(" ").append(words);
+    if (!words.empty()) out.append(" ").append(words);
   }
-  return line;
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {
@@ -138,7 +164,8 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
     if (!coordinates) {
       out.Line(survey.Record(point));
     } else if (point.listed) {
-      out.Line(CoordinateListingLine(survey, point));
+      AppendCoordinateListingLine(out.Buffer(), survey, point);
+      out.EndLine();
     }
   }
 }
@@ -170,7 +197,8 @@ void WriteTextProducts(RunState& st) {
     WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
       for (const ComputedPoint& point : st.survey.points) {
         if (point.kind == PointKind::Detail) {
-          out.Line(CoordinateTextLine(st.survey, point, decimals));
+          AppendCoordinateTextLine(out.Buffer(), st.survey, point, decimals);
+          out.EndLine();
         }
       }
     });

@@ -28,11 +28,13 @@ bool ProductOverInput(RunState& st, const std::string& path);
 void WriteTextProducts(RunState& st);
 
 // A line of the control-point listing (.kc and the head of the TRIDO book and
-// .td1), and a detail point's line of the coordinate listing (.td1).
+// .td1), and a detail point's line of the coordinate listing (.td1), appended.
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry);
-std::string CoordinateListingLine(const Survey& survey, const ComputedPoint& point);
+void AppendCoordinateListingLine(std::string& out, const Survey& survey,
+                                 const ComputedPoint& point);
 
-// A line of the coordinate text file for a computed detail point.
-std::string CoordinateTextLine(const Survey& survey, const ComputedPoint& point, int decimals);
+// A line of the coordinate text file for a computed detail point, appended.
+void AppendCoordinateTextLine(std::string& out, const Survey& survey, const ComputedPoint& point,
+                              int decimals);
 
 }  // namespace kavu

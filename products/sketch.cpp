@@ -44,24 +44,42 @@ std::string T(std::string_view utf8) { return Utf8ToTcvn3(utf8); }
 // One detail row: point, distance, horizontal angle, vertical angle, prism
 // height, note between the bars of columns 1, 8, 19, 34, 48, 62 and 77. A name
 // of six characters or more pushes the rest of its row to the right.
-std::string DetailRow(const Survey& survey, const ComputedPoint& point) {
+void AppendDetailRow(std::string& out, const Survey& survey, const ComputedPoint& point) {
   const std::string_view record = survey.Record(point);
   const double reading = PackedDegrees(Val(RecordField(record, 1)));
   const double distance = RoundEven(std::fabs(Val(RecordField(record, 2))), 3);
   const double zenith = PackedDegrees(Val(RecordField(record, 3)));
-  const std::size_t fields =
-      static_cast<std::size_t>(std::count(record.begin(), record.end(), ' ')) + 1;
-  std::string note;
+  const auto fields = std::count(record.begin(), record.end(), ' ') + 1;
+  out.push_back('|');
+  std::size_t from = out.size();
+  out.append(survey.Name(point));
+  PadBehind(out, from, 5);
+  out.append(" |");
+  from = out.size();
+  AppendMask(out, distance, kDistanceMask);
+  PadInFront(out, from, 9);
+  out.append(" |  ");
+  AppendAngle(out, reading, " ", 10);
+  out.append("  |  ");
+  from = out.size();
+  AppendAngle(out, zenith, " ", 9);
+  PadBehind(out, from, 11);
+  out.append("| ");
+  from = out.size();
+  AppendMask(out, survey.Prism(point), kPrismMask);
+  PadInFront(out, from, 10);
+  out.append("  | ");
+  // The note: the words of a record with them, or of a reading of 0.
+  from = out.size();
   if (fields == 5) {
-    note = std::string(12, ' ');
+    out.append(12, ' ');
   } else if (reading == 0 || point.words) {
-    note = RecordField(record, 5);
-    if (fields == 7) note.append(" ").append(RecordField(record, 6));
+    out.append(RecordField(record, 5));
+    if (fields == 7) out.append(" ").append(RecordField(record, 6));
   }
-  return "|" + LString(survey.Name(point), 5) + " |" + RString(Mask(distance, "#####.000"), 9) +
-         " |  " + GocStringText(reading) + "  |  " + NumberWidth(GocSt1(zenith), 11) + "| " +
-         NumberWidth(RString(PrismText(survey.Prism(point)), 10), 10) + "  | " + FixedWidth(note, 12) +
-         " |";
+  out.resize(std::min(out.size(), from + 12));
+  PadBehind(out, from, 12);
+  out.append(" |");
 }
 
 void WriteStation(TextOut& out, const Survey& survey, const StationResult& station,
@@ -88,7 +106,9 @@ void WriteStation(TextOut& out, const Survey& survey, const StationResult& stati
   out.Line(std::string(kFormWidth, '-'));
 
   for (const ComputedPoint& point : points) {
-    if (point.kind == PointKind::Detail) out.Line(DetailRow(survey, point));
+    if (point.kind != PointKind::Detail) continue;
+    AppendDetailRow(out.Buffer(), survey, point);
+    out.EndLine();
   }
 
   // The closing row: orientation distance, reading and the orientation point.
