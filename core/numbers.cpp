@@ -1,6 +1,7 @@
 #include "core/numbers.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cmath>
 #include <cstddef>
@@ -103,8 +104,21 @@ Scan ScanNumber(std::string_view text) {
 }
 
 double PowerOfTen(int n) {
+  // The products of tens, each exact up to 10^22.
+  static constexpr auto kPowers = [] {
+    std::array<double, 23> powers{};
+    double p = 1;
+    for (double& power : powers) {
+      power = p;
+      p *= 10;
+    }
+    return powers;
+  }();
+  const int magnitude = n < 0 ? -n : n;
+  if (magnitude < static_cast<int>(kPowers.size()))
+    return kPowers[static_cast<std::size_t>(magnitude)];
   double p = 1;
-  for (int k = 0; k < (n < 0 ? -n : n); ++k) p *= 10;
+  for (int k = 0; k < magnitude; ++k) p *= 10;
   return p;
 }
 
@@ -166,7 +180,8 @@ double RoundEvenWhole(double x) {
   const double diff = x - f;
   if (diff > 0.5) return f + 1;
   if (diff < 0.5) return f;
-  return std::fmod(f, 2.0) == 0 ? f : f + 1;
+  // Half way: the even one of f and f + 1 (f / 2 is exact).
+  return std::floor(f / 2) * 2 == f ? f : f + 1;
 }
 
 double RoundEven(double x, int n) {

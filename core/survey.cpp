@@ -1,5 +1,6 @@
 #include "core/survey.h"
 
+#include <array>
 #include <cstring>
 
 #include "core/messages.h"
@@ -28,17 +29,12 @@ std::uint64_t Survey::Keep(std::string_view text) {
   return at;
 }
 
-std::string_view Survey::Name(const ComputedPoint& point) const {
-  return RecordField(Record(point), point.kind == PointKind::Peg ? 5 : 0).substr(0, kNameWidth);
-}
-
-std::string_view Survey::Code(const ComputedPoint& point) const {
-  return point.words ? RecordField(Record(point), 5) : std::string_view();
-}
-
-std::string_view Survey::Note(const ComputedPoint& point) const {
-  return point.words || point.kind == PointKind::Peg ? RecordField(Record(point), 6)
-                                                     : std::string_view();
+Survey::PointTexts Survey::Texts(const ComputedPoint& point) const {
+  std::array<std::string_view, 7> f;
+  RecordFields(Record(point), f);
+  const bool peg = point.kind == PointKind::Peg;
+  return {(peg ? f[5] : f[0]).substr(0, kNameWidth), point.words ? f[5] : std::string_view(),
+          point.words || peg ? f[6] : std::string_view()};
 }
 
 double Survey::Prism(const ComputedPoint& point) const {

@@ -112,9 +112,14 @@ struct Survey {
   std::string_view Record(const ComputedPoint& point) const {
     return Text(point.record, point.recordSize);
   }
-  std::string_view Name(const ComputedPoint& point) const;
-  std::string_view Code(const ComputedPoint& point) const;
-  std::string_view Note(const ComputedPoint& point) const;
+  // A point's name, code and note within its record line, found at once.
+  struct PointTexts {
+    std::string_view name, code, note;
+  };
+  PointTexts Texts(const ComputedPoint& point) const;
+  std::string_view Name(const ComputedPoint& point) const { return Texts(point).name; }
+  std::string_view Code(const ComputedPoint& point) const { return Texts(point).code; }
+  std::string_view Note(const ComputedPoint& point) const { return Texts(point).note; }
   double Prism(const ComputedPoint& point) const;  // the prism height of its record
 
   // The point a report line names (trimmed, empty when none) and the line.

@@ -2,6 +2,7 @@
 // Every text here is TCVN3 bytes, one byte per character.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <string>
 #include <string_view>
@@ -79,5 +80,19 @@ void SplitFields(std::string& line, std::vector<std::string_view>& fields);
 // Field k (from 0) of a line whose fields are set off by single spaces, or the
 // empty text past its last field.
 std::string_view RecordField(std::string_view record, std::size_t k);
+// The first fields of such a line, the empty text past its last; the number
+// of its fields.
+template <std::size_t N>
+std::size_t RecordFields(std::string_view record, std::array<std::string_view, N>& fields) {
+  fields = {};
+  std::size_t count = 0;
+  for (std::size_t start = 0; !record.empty() && start <= record.size(); ++count) {
+    const std::size_t space = record.find(' ', start);
+    const std::size_t end = space == std::string_view::npos ? record.size() : space;
+    if (count < N) fields[count] = record.substr(start, end - start);
+    start = end + 1;
+  }
+  return count;
+}
 
 }  // namespace kavu

@@ -80,10 +80,7 @@ class EntityWriter {
 
 }  // namespace
 
-bool indxf(const RunState& st) {
-  TextOut out;
-  if (!out.open(st.daufile + ".dxf")) return false;
-
+void WriteDrawing(TextOut& out, const RunState& st) {
   // Label height on the ground: millimetres on paper times the scale.
   double h = Val(st.Htext) * Val(st.Tyle) / 1000;
   if (!std::isfinite(h) || !std::isfinite(1.5 * h)) h = 0;
@@ -110,7 +107,6 @@ bool indxf(const RunState& st) {
   out.Line("ENDSEC");
   out.Line(" 0");
   out.Line("EOF");
-  return out.close();
 }
 
 }  // namespace kavu

@@ -70,7 +70,8 @@ void AppendColumn(std::string& out, double x, const NumberMask& mask, std::size_
 
 void AppendCoordinateTextLine(std::string& out, const Survey& survey, const ComputedPoint& p,
                               int decimals) {
-  AppendFixed(out, survey.Name(p), 5);
+  const Survey::PointTexts texts = survey.Texts(p);
+  AppendFixed(out, texts.name, 5);
   out.push_back(' ');
   std::size_t from = out.size();
   AppendMask(out, p.x, kNorthingMask);
@@ -84,9 +85,9 @@ void AppendCoordinateTextLine(std::string& out, const Survey& survey, const Comp
   AppendNumberText(out, RoundEven(MillimetreValue(p.z), decimals));
   PadInFront(out, from, 9);
   out.push_back(' ');
-  out.append(survey.Code(p));
+  out.append(texts.code);
   out.push_back(' ');
-  out.append(survey.Note(p));
+  out.append(texts.note);
 }
 
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
@@ -107,42 +108,32 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
 }
 
 void AppendCoordinateListingLine(std::string& out, const Survey& survey, const ComputedPoint& p) {
+  const Survey::PointTexts texts = survey.Texts(p);
   const std::size_t from = out.size();
-  out.append(survey.Name(p));
+  out.append(texts.name);
   PadBehind(out, from, 5);
   AppendColumn(out, p.x, kNorthingMask, 12);
   AppendColumn(out, p.y, kEastingMask, 12);
   AppendColumn(out, p.z, kHeightMask, 12);
   AppendColumn(out, survey.Prism(p), kPrismMask, 10);
-  for (const std::string_view words : {survey.Code(p), survey.Note(p)}) {
+  for (const std::string_view words : {texts.code, texts.note}) {
     if (!words.empty()) out.append(" ").append(words);
   }
 }
 
-bool ProductOverInput(RunState& st, const std::string& path) {
+std::optional<std::string> OverInput(const RunState& st, const std::string& path) {
   for (const std::string& input : st.inputs) {
-    if (WouldReplace(path, input)) {
-      st.unwritable.push_back(path + std::string(msg::kProductIsInput));
-      return true;
-    }
+    if (WouldReplace(path, input)) return path + std::string(msg::kProductIsInput);
   }
-  return false;
+  return std::nullopt;
 }
 
-namespace {
-
-// Writes one product whole or not at all; a product that cannot be written, or
-// would replace a file the run reads, is named for the summary and the run
-// goes on with the next.
-template <typename Body>
-void WriteProduct(RunState& st, const std::string& path, Body body) {
-  if (ProductOverInput(st, path)) return;
-  TextOut out(path);
-  body(out);
-  if (!out.commit()) st.unwritable.push_back(path);
+bool ProductOverInput(RunState& st, const std::string& path) {
+  const auto refused = OverInput(st, path);
+  if (refused) st.unwritable.push_back(*refused);
+  return refused.has_value();
 }
 
-// The control-point listing, ended by an empty line.
 void WriteControlListing(TextOut& out, const Survey& survey) {
   for (const ControlListing& entry : survey.controlListing) {
     out.Line(ControlListingLine(survey, entry));
@@ -150,8 +141,6 @@ void WriteControlListing(TextOut& out, const Survey& survey) {
   out.Line("");
 }
 
-// The records of each computed station under its station and orientation
-// lines: as they were read (the TRIDO book), or as their coordinates (.td1).
 void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
   std::optional<std::size_t> station;
   for (const ComputedPoint& point : survey.points) {
@@ -170,39 +159,17 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
   }
 }
 
+void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals) {
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind != PointKind::Detail) continue;
+    AppendCoordinateTextLine(out.Buffer(), survey, point, decimals);
+    out.EndLine();
+  }
+}
+
 int HeightDecimals(const std::string& text) {
   const double d = RoundEvenWhole(Val(text));
   return static_cast<int>(std::clamp(d, 0.0, 10.0));
-}
-
-}  // namespace
-
-void WriteTextProducts(RunState& st) {
-  if (Ticked(st.fkc)) {
-    WriteProduct(st, st.daufile + ".kc",
-                 [&](TextOut& out) { WriteControlListing(out, st.survey); });
-  }
-  if (Ticked(st.fasc)) {
-    std::error_code ignored;
-    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
-    for (const bool coordinates : {false, true}) {
-      WriteProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1, [&](TextOut& out) {
-        WriteControlListing(out, st.survey);
-        WriteStationRecords(out, st.survey, coordinates);
-      });
-    }
-  }
-  if (Ticked(st.ftd)) {
-    const int decimals = HeightDecimals(st.txtSoleDC);
-    WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
-      for (const ComputedPoint& point : st.survey.points) {
-        if (point.kind == PointKind::Detail) {
-          AppendCoordinateTextLine(out.Buffer(), st.survey, point, decimals);
-          out.EndLine();
-        }
-      }
-    });
-  }
 }
 
 }  // namespace kavu

@@ -1,6 +1,7 @@
 // The run's own reports and text products.
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include "core/state.h"
@@ -19,13 +20,23 @@ void WriteStationListing(TextOut& out, const Survey& survey);
 // sketch show it.
 std::string OrientationDistanceText(double distance);
 
-// True when the product at path would replace a file the run reads: it is
-// then named in st.unwritable and must be passed over.
+// The refusal to write the product at path when it would replace a file the
+// run reads (the path and the words saying so), or nothing.
+std::optional<std::string> OverInput(const RunState& st, const std::string& path);
+// The same, the refusal named in st.unwritable; true when the product must be
+// passed over.
 bool ProductOverInput(RunState& st, const std::string& path);
 
-// The products after the station loop: .kc, the regenerated field book with
-// its .td1, the .txt. Unwritable ones are added to st.unwritable.
-void WriteTextProducts(RunState& st);
+// The products after the station loop: the control-point listing (.kc, and
+// the head of the TRIDO book and the .td1), ended by an empty line; the
+// records of each computed station under its station and orientation lines,
+// as they were read (the TRIDO book) or as their coordinates (.td1); the
+// coordinate text file (.txt) with heights to decimals.
+void WriteControlListing(TextOut& out, const Survey& survey);
+void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates);
+void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals);
+// The decimals of the .txt heights, as typed (0 to 10).
+int HeightDecimals(const std::string& text);
 
 // A line of the control-point listing (.kc and the head of the TRIDO book and
 // .td1), and a detail point's line of the coordinate listing (.td1), appended.

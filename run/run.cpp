@@ -3,7 +3,11 @@
 #include <algorithm>
 #include <ctime>
 #include <filesystem>
+#include <functional>
+#include <optional>
 #include <string>
+#include <thread>
+#include <vector>
 
 #include "core/control_points.h"
 #include "core/lookup.h"
@@ -249,10 +253,6 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   }
 }
 
-void CommitKeptFile(RunState& st, TextOut& file) {
-  if (file.is_open() && !file.commit()) st.unwritable.push_back(Utf8FromPath(file.path()));
-}
-
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
   if (ProductOverInput(st, path)) return;
   if (!file.open(path)) st.unwritable.push_back(path);
@@ -270,6 +270,68 @@ void RemoveProduct(const RunState& st, const std::string& path) {
   }
   std::error_code ignored;
   std::filesystem::remove(PathFromUtf8(path), ignored);
+}
+
+// A product of the run: written on one of two threads, then put in place in
+// the order the summary names what could not be written.
+struct Product {
+  TextOut own;              // a product opened at the end of the run
+  TextOut* kept = nullptr;  // or a file kept open through the run
+  std::function<void(TextOut&)> write;
+  std::string failure;                 // its name in the summary when it cannot be written
+  std::optional<std::string> refused;  // it would replace a file the run reads
+  bool commit = true;                  // a kept file is put in place only when it was opened
+  std::size_t weight = 0;              // its share of the writing
+
+  TextOut& File() { return kept != nullptr ? *kept : own; }
+};
+
+Product KeptProduct(TextOut& file, std::size_t weight, std::function<void(TextOut&)> write) {
+  Product product;
+  product.kept = &file;
+  product.commit = file.is_open();
+  product.failure = Utf8FromPath(file.path());
+  product.weight = weight;
+  product.write = std::move(write);
+  return product;
+}
+
+Product NewProduct(const RunState& st, const std::string& path, std::size_t weight,
+                   std::function<void(TextOut&)> write) {
+  Product product;
+  product.refused = OverInput(st, path);
+  if (!product.refused) product.own.open(path);
+  product.failure = path;
+  product.weight = weight;
+  product.write = std::move(write);
+  return product;
+}
+
+// Writes every product, shared out by weight between this thread and
+// another (the heaviest first, each to the one with less to write); each
+// writes only its own files, reading the run's result.
+void WriteProducts(std::vector<Product>& products) {
+  std::vector<Product*> order;
+  for (Product& product : products) {
+    if (!product.refused) order.push_back(&product);
+  }
+  std::stable_sort(order.begin(), order.end(),
+                   [](const Product* a, const Product* b) { return a->weight > b->weight; });
+  std::vector<Product*> here, there;
+  std::size_t hereWeight = 0, thereWeight = 0;
+  for (Product* product : order) {
+    (hereWeight <= thereWeight ? here : there).push_back(product);
+    (hereWeight <= thereWeight ? hereWeight : thereWeight) += product->weight + 1;
+  }
+  const auto write = [](const std::vector<Product*>& share) {
+    for (Product* product : share) {
+      TextOut& file = product->File();
+      if (product->write) product->write(file);
+      file.finish();
+    }
+  };
+  std::jthread other(write, std::cref(there));
+  write(here);
 }
 
 RunResult Finish(RunState& st, RunOutcome outcome) {
@@ -361,24 +423,59 @@ RunResult tinh_Click(RunState& st, Host& host) {
   }
 
   // A run without errors leaves no error report and no station listing.
+  const Survey& survey = st.survey;
+  const std::size_t details = survey.points.size();
+  std::vector<Product> products;
   if (st.err == 0) {
     st.errFile.abandon();
     st.cpvFile.abandon();
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
-    WriteStationListing(st.cpvFile, st.survey);
-    CommitKeptFile(st, st.cpvFile);
-    WriteErrorReport(st.errFile, st.survey);
-    CommitKeptFile(st, st.errFile);
+    products.push_back(KeptProduct(st.cpvFile, survey.stations.size(),
+                                   [&](TextOut& out) { WriteStationListing(out, survey); }));
+    products.push_back(KeptProduct(st.errFile, survey.report.size(),
+                                   [&](TextOut& out) { WriteErrorReport(out, survey); }));
   }
-  WriteTextProducts(st);
-  if (Ticked(st.fdxf) && !ProductOverInput(st, st.daufile + ".dxf") && !indxf(st)) {
-    st.unwritable.push_back(st.daufile + ".dxf");
+  if (Ticked(st.fkc)) {
+    products.push_back(NewProduct(st, st.daufile + ".kc", survey.controlListing.size(),
+                                  [&](TextOut& out) { WriteControlListing(out, survey); }));
   }
-  if (Ticked(st.fcp)) WritePegBlocks(st.cpFile, st.survey);
-  if (Ticked(st.fsdo)) WriteSketch(st.sdoFile, st.survey, st.nhap);
-  CommitKeptFile(st, st.cpFile);
-  CommitKeptFile(st, st.sdoFile);
+  if (Ticked(st.fasc)) {
+    std::error_code ignored;
+    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
+    for (const bool coordinates : {false, true}) {
+      products.push_back(NewProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1,
+                                    (coordinates ? 3 : 1) * details,
+                                    [&, coordinates](TextOut& out) {
+                                      WriteControlListing(out, survey);
+                                      WriteStationRecords(out, survey, coordinates);
+                                    }));
+    }
+  }
+  if (Ticked(st.ftd)) {
+    const int decimals = HeightDecimals(st.txtSoleDC);
+    products.push_back(
+        NewProduct(st, st.daufile + ".txt", 2 * details,
+                   [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
+  }
+  if (Ticked(st.fdxf)) {
+    products.push_back(NewProduct(st, st.daufile + ".dxf", 5 * details,
+                                  [&](TextOut& out) { WriteDrawing(out, st); }));
+  }
+  products.push_back(KeptProduct(st.cpFile, survey.stations.size(), [&](TextOut& out) {
+    if (Ticked(st.fcp)) WritePegBlocks(out, survey);
+  }));
+  products.push_back(KeptProduct(st.sdoFile, 5 * details, [&](TextOut& out) {
+    if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
+  }));
+  WriteProducts(products);
+  for (Product& product : products) {
+    if (product.refused) {
+      st.unwritable.push_back(*product.refused);
+    } else if (product.commit && !product.File().commit()) {
+      st.unwritable.push_back(product.failure);
+    }
+  }
   if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");
 
   jobLock.Release();
