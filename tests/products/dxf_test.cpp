@@ -53,8 +53,8 @@ TEST(Dxf, ControlAndDetailPointsWithTheirLabels) {
 
   RunState one;
   AddPoint(one.survey, "7", 100.25, 200.75);
-  for (const auto& [tyle, htext] : {std::pair{"500", "mm"}, std::pair{"", "2.0"},
-                                    std::pair{"1D300", "1D300"}}) {
+  for (const auto& [tyle, htext] :
+       {std::pair{"500", "mm"}, std::pair{"", "2.0"}, std::pair{"1D300", "1D300"}}) {
     EXPECT_EQ(Drawing(one, tyle, htext), Expected("dxf/height_not_a_number.dxf")) << tyle;
   }
 }
