@@ -88,6 +88,13 @@ bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
   LineReader reader(fieldBook);
   for (std::string_view raw; reader.Next(raw);) {
     ++number;
+    // Only a record that begins with TR can be a control or station record.
+    const std::string_view trimmed = TrimView(raw);
+    if (!trimmed.empty() && !trimmed.starts_with("TR")) {
+      ++working;
+      reachable = reachable || stationSeen;
+      continue;
+    }
     if (!ReadRecord(raw, line, fields)) continue;
     st.line = number;
     if (IsControlRecord(fields)) {

@@ -1,5 +1,6 @@
 #include "core/lines.h"
 
+#include <cstring>
 #include <fstream>
 #include <ios>
 #include <iterator>
@@ -33,8 +34,17 @@ namespace kavu {
 bool LineReader::Next(std::string_view& line) {
   if (next_ >= content_.size()) return false;
   const std::size_t start = next_;
-  std::size_t end = start;
-  while (end < content_.size() && content_[end] != '\r' && content_[end] != '\n') ++end;
+  // The line ends at the first CR or LF: the LF found first, then a CR
+  // before it.
+  const char* const from = content_.data() + start;
+  const std::size_t left = content_.size() - start;
+  const void* const lf = std::memchr(from, '\n', left);
+  const std::size_t toLf =
+      lf != nullptr ? static_cast<std::size_t>(static_cast<const char*>(lf) - from) : left;
+  const void* const cr = std::memchr(from, '\r', toLf);
+  const std::size_t end =
+      start +
+      (cr != nullptr ? static_cast<std::size_t>(static_cast<const char*>(cr) - from) : toLf);
   if (end == content_.size()) {
     line = content_.substr(start);
     next_ = content_.size();
@@ -123,6 +133,11 @@ std::filesystem::path TempPathOf(const std::filesystem::path& path) {
   return temp;
 }
 
+namespace {
+// The text written to the file at a time.
+constexpr std::size_t kBlock = 1 << 20;
+}  // namespace
+
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
 
 TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
@@ -164,14 +179,13 @@ bool TextOut::open(const std::filesystem::path& path) {
   file_.reset(std::fopen(temp.c_str(), "wb"));
 #endif
   failed_ = file_ == nullptr;
+  // Room for a block and the line that fills it, so that it never grows.
+  buffer_.reserve(kBlock + (1 << 16));
   return !failed_;
 }
 
 bool TextOut::ok() const { return file_ != nullptr && !failed_; }
 
-namespace {
-constexpr std::size_t kBlock = 1 << 20;
-}  // namespace
 
 bool TextOut::Drain() {
   if (!buffer_.empty() && ok() &&
@@ -222,6 +236,7 @@ bool FlushToDisk(std::FILE* file) {
 bool TextOut::finish() {
   if (!file_) return !failed_;
   bool written = Drain() && FlushToDisk(file_.get());
+  std::string().swap(buffer_);  // the block's memory goes back at once
   written = std::fclose(file_.release()) == 0 && written;
   if (!written) failed_ = true;
   finished_ = true;
@@ -247,7 +262,7 @@ bool TextOut::commit() {
 }
 
 void TextOut::abandon() {
-  buffer_.clear();
+  std::string().swap(buffer_);
   if (!file_ && !finished_) return;
   finished_ = false;
   if (file_) std::fclose(file_.release());

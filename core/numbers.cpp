@@ -174,6 +174,12 @@ double Val(std::string_view text) { return ScanAny(text).value; }
 
 bool HasNumber(std::string_view text) { return ScanAny(text).has_digit; }
 
+bool ReadNumber(std::string_view text, double& value) {
+  const Scan scan = ScanAny(text);
+  value = scan.value;
+  return scan.has_digit;
+}
+
 double RoundEvenWhole(double x) {
   if (!std::isfinite(x)) return x;
   const double f = std::floor(x);

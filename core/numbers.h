@@ -16,6 +16,8 @@ double Val(std::string_view text);
 
 // True when Val finds at least one digit in the text's numeric prefix.
 bool HasNumber(std::string_view text);
+// Both at once: value = Val(text); HasNumber(text) returned.
+bool ReadNumber(std::string_view text, double& value);
 
 // Nearest whole number, ties to the even neighbour (2.5 -> 2, 3.5 -> 4).
 double RoundEvenWhole(double x);

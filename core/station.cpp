@@ -1,6 +1,7 @@
 #include "core/station.h"
 
 #include <cmath>
+#include <optional>
 #include <string>
 
 #include "core/lookup.h"
@@ -40,7 +41,12 @@ AngleParts SplitPacked(double goc) {
   const double whole = RoundEvenWhole(goc);
   AngleParts parts;
   parts.do1 = std::trunc(whole / 10000);
-  parts.phut = static_cast<std::int16_t>(std::trunc(std::fmod(whole, 10000) / 100));
+  // The remainder of a whole number below 2^53 is that of its integer.
+  const double minutesAndSeconds =
+      std::fabs(whole) < 9007199254740992.0
+          ? static_cast<double>(static_cast<std::int64_t>(whole) % 10000)
+          : std::fmod(whole, 10000);
+  parts.phut = static_cast<std::int16_t>(std::trunc(minutesAndSeconds / 100));
   parts.giay = RoundEven((goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
   return parts;
 }
@@ -53,20 +59,42 @@ double PartsDegrees(const AngleParts& parts) {
 // without a usable distance (an angle-only observation) or, when heights are
 // wanted, with a zenith angle that cannot give one, would put a false point
 // into the products: it is reported once and passed over.
-bool ObservationUsable(RunState& st) {
-  if (NumbersMissing(st, {1, 2, 3, 4})) return false;
-  if (Val(st.Field(2)) == 0) {
-    EntryError(st, msg::kNoDistance);
-    return false;
-  }
-  if (Ticked(st.fdc)) {
-    const double zenith = PackedDegrees(Val(st.Field(3)));
-    if (!(zenith > 0 && zenith < 180)) {
-      EntryError(st, msg::kWrongZenith);
-      return false;
+// The numbers of a usable observation: reading, distance, zenith angle and
+// prism height, each read once.
+struct Observation {
+  double reading = 0, distance = 0, zenith = 0, prism = 0;
+};
+std::optional<Observation> UsableObservation(RunState& st) {
+  double numbers[4];
+  for (std::size_t i = 0; i < 4; ++i) {
+    if (!ReadNumber(st.Field(i + 1), numbers[i])) {
+      EntryError(st, msg::kNotANumber);
+      return std::nullopt;
     }
   }
-  return true;
+  const Observation o{numbers[0], numbers[1], numbers[2], numbers[3]};
+  if (o.distance == 0) {
+    EntryError(st, msg::kNoDistance);
+    return std::nullopt;
+  }
+  if (Ticked(st.fdc)) {
+    const double zenith = PackedDegrees(o.zenith);
+    if (!(zenith > 0 && zenith < 180)) {
+      EntryError(st, msg::kWrongZenith);
+      return std::nullopt;
+    }
+  }
+  return o;
+}
+
+// The point of a usable observation: its height, then its coordinates.
+void ComputeObservation(RunState& st, const Observation& o) {
+  st.s = o.distance;
+  st.goc = o.zenith;
+  st.ccg = o.prism;
+  TinhDoCao(st);
+  st.goc = o.reading;
+  TinhToaDo(st);
 }
 
 // Azimuth and distance from (xFrom, yFrom) to the station, reported against
@@ -191,7 +219,8 @@ void ReportLongName(RunState& st, std::string_view name) {
 
 void STP5(RunState& st) {
   ReportLongName(st, st.Field(0));
-  if (!ObservationUsable(st)) return;
+  const auto observation = UsableObservation(st);
+  if (!observation) return;
   if (st.dctdau == 1) {
     st.DiemDau = st.TenDiem.str();
     st.DiemCuoi = st.TenDiem.str();
@@ -199,12 +228,7 @@ void STP5(RunState& st) {
   } else {
     st.DiemCuoi = st.TenDiem.str();
   }
-  st.s = Val(st.Field(2));
-  st.goc = Val(st.Field(3));
-  st.ccg = Val(st.Field(4));
-  TinhDoCao(st);
-  st.goc = Val(st.Field(1));
-  TinhToaDo(st);
+  ComputeObservation(st, *observation);
   // Descriptive words are the code; a record without them is listed too.
   const bool words = (st.stp == 6 || st.stp == 7) && DescriptiveWords(st);
   NotePoint(st, PointKind::Detail, words, st.stp == 5 || words);
@@ -227,13 +251,9 @@ void STP6(RunState& st) {
     return;
   }
   ReportLongName(st, st.Field(5));
-  if (!ObservationUsable(st)) return;
-  st.s = Val(st.Field(2));
-  st.goc = Val(st.Field(3));
-  st.ccg = Val(st.Field(4));
-  TinhDoCao(st);
-  st.goc = Val(st.Field(1));
-  TinhToaDo(st);
+  const auto observation = UsableObservation(st);
+  if (!observation) return;
+  ComputeObservation(st, *observation);
   NotePoint(st, PointKind::Peg, false, false);
   // The peg becomes a known point for the rest of the run, listed with its
   // height and note.

@@ -93,23 +93,37 @@ void Normalise(std::string& line) {
 template <typename Add>
 void EachField(std::string_view text, Add add) {
   if (text.empty()) return;
-  for (std::size_t start = 0;;) {
-    const std::size_t space = text.find(' ', start);
-    if (space == std::string_view::npos) {
-      add(text.substr(start));
-      return;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    if (text[i] == ' ') {
+      add(text.substr(start, i - start));
+      start = i + 1;
     }
-    add(text.substr(start, space - start));
-    start = space + 1;
   }
+  add(text.substr(start));
 }
 
 }  // namespace
 
 void SplitFields(std::string& line, std::vector<std::string_view>& fields) {
-  Normalise(line);
   fields.clear();
-  EachField(line, [&](std::string_view field) { fields.push_back(field); });
+  // Most lines are already normal: split in the pass that finds it out.
+  const std::string_view text = line;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    const char c = text[i];
+    if (c == '\t' || (c == ' ' && i > 0 && text[i - 1] == ' ')) {
+      Normalise(line);
+      fields.clear();
+      EachField(line, [&](std::string_view field) { fields.push_back(field); });
+      return;
+    }
+    if (c == ' ') {
+      fields.push_back(text.substr(start, i - start));
+      start = i + 1;
+    }
+  }
+  if (!text.empty()) fields.push_back(text.substr(start));
 }
 
 std::vector<std::string> SplitFields(std::string& line) {
