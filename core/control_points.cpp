@@ -53,6 +53,7 @@ bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
   std::vector<std::string_view> fields;
   st.MangKhongChe.clear();
   st.workingLines = 0;
+  st.stationRecords = 0;
   if (commonFile) {
     const std::string path = Trim(st.txtFKC);
     if (path.empty()) {
@@ -103,7 +104,9 @@ bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
     } else {
       ++working;
       reachable = reachable || stationSeen;
-      stationSeen = stationSeen || IsStationRecord(line);
+      const bool station = IsStationRecord(line);
+      st.stationRecords += station ? 1 : 0;
+      stationSeen = stationSeen || station;
     }
   }
   st.line = 0;

@@ -32,7 +32,7 @@ std::optional<std::uint64_t> Within(std::string_view whole, std::string_view tex
 std::uint64_t Place(RunState& st, std::string_view text) {
   if (const auto at = Within(st.dong, text)) {
     if (!st.dongKept) {
-      st.dongAt = st.survey.Keep(st.dong);
+      st.dongAt = st.survey.KeepRecord(st.dong);
       st.dongKept = true;
     }
     return st.dongAt + *at;

@@ -134,6 +134,7 @@ struct ComputationFields {
   // neither blank nor control records, and their number; none when no
   // station record stands where the station loop can reach it.
   std::size_t workingLines = 0;
+  std::size_t stationRecords = 0;  // the records of the working copy that begin a station
   // The field-book line (from 1) of the record being read (0 when none).
   std::size_t line = 0;
 

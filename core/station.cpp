@@ -132,8 +132,7 @@ void NotePoint(RunState& st, PointKind kind, bool words, bool listed) {
   point.x = st.xi;
   point.y = st.yi;
   point.z = st.zi;
-  point.record = Place(st, st.dong);
-  point.recordSize = static_cast<std::uint32_t>(st.dong.size());
+  point.record = Place(st, st.dong) & ((std::uint64_t{1} << 61) - 1);
   point.line = static_cast<std::uint32_t>(st.line);
   point.station = static_cast<std::uint32_t>(st.survey.stations.size() - 1);
   point.kind = kind;

@@ -15,8 +15,21 @@ constexpr std::size_t kNameWidth = 12;
 }  // namespace
 
 // A million points and their report lines fit in little memory.
-static_assert(sizeof(ComputedPoint) <= 48);
+static_assert(sizeof(ComputedPoint) <= 40);
 static_assert(sizeof(ReportEntry) <= 16);
+
+std::string_view Survey::Record(const ComputedPoint& point) const {
+  const std::string_view rest = Text(point.record, std::string_view::npos);
+  std::size_t end = 0;
+  while (end < rest.size() && rest[end] != '\r' && rest[end] != '\n') ++end;
+  return rest.substr(0, end);
+}
+
+std::uint64_t Survey::KeepRecord(std::string_view record) {
+  const std::uint64_t at = Keep(record);
+  made.push_back('\n');
+  return at;
+}
 
 std::string_view Survey::Text(std::uint64_t at, std::size_t size) const {
   if (at < book.size()) return std::string_view(book).substr(at, size);
@@ -63,8 +76,7 @@ std::string Survey::TextOf(const ReportEntry& entry) const {
 
 ComputedPoint& Survey::AddPoint(std::string_view record, PointKind kind, double x, double y) {
   ComputedPoint point;
-  point.record = Keep(record);
-  point.recordSize = static_cast<std::uint32_t>(record.size());
+  point.record = KeepRecord(record);
   point.kind = kind;
   point.x = x;
   point.y = y;

@@ -58,18 +58,19 @@ enum class PointKind : std::uint8_t { Detail, Peg };
 // A detail point or an auxiliary peg that was computed.
 struct ComputedPoint {
   double x = 0, y = 0;
-  double z = 0;              // the height as computed, unrounded (also with heights off)
-  std::uint64_t record = 0;  // where its record line stands in the survey's texts
-  std::uint32_t recordSize = 0;
-  std::uint32_t line = 0;     // field-book line of its record (from 1)
-  std::uint32_t station = 0;  // index into Survey::stations
-  PointKind kind = PointKind::Detail;
+  double z = 0;  // the height as computed, unrounded (also with heights off)
+  // Where its record line stands in the survey's texts, fields set off by
+  // single spaces, up to the line end that follows it there.
+  std::uint64_t record : 61 = 0;
+  PointKind kind : 1 = PointKind::Detail;
   // Whether the coordinate listing (.td1) gives it a line: a detail point
   // whose record has no words after the prism height, or descriptive words.
-  bool listed = false;
+  bool listed : 1 = false;
   // A detail point whose sixth field is descriptive words: its code, and its
   // note after them.
-  bool words = false;
+  bool words : 1 = false;
+  std::uint32_t line = 0;     // field-book line of its record (from 1)
+  std::uint32_t station = 0;  // index into Survey::stations
 };
 
 // A line of the control-point listing that heads the .kc, the TRIDO book and
@@ -109,9 +110,9 @@ struct Survey {
   // Keeps a text made by the run; where it stands.
   std::uint64_t Keep(std::string_view text);
 
-  std::string_view Record(const ComputedPoint& point) const {
-    return Text(point.record, point.recordSize);
-  }
+  std::string_view Record(const ComputedPoint& point) const;
+  // Keeps a record line among the made texts, followed by its line end.
+  std::uint64_t KeepRecord(std::string_view record);
   // A point's name, code and note within its record line, found at once.
   struct PointTexts {
     std::string_view name, code, note;

@@ -74,9 +74,10 @@ class WorkingCopy {
     ++read_;
     st_.line = number_;
     st_.stp = static_cast<int>(st_.MangTruong.size());
-    // A line that stands in the field book as it reads is not kept again.
+    // A line that stands in the field book as it reads, up to its line end,
+    // is not kept again.
     const std::string_view standing = TrimView(raw);
-    if (standing == st_.dong) {
+    if (standing == st_.dong && standing.end() == raw.end()) {
       st_.dongAt = static_cast<std::uint64_t>(standing.data() - st_.survey.book.data());
       st_.dongKept = true;
     }
@@ -400,6 +401,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   // Room for a point and a report line a line: the vectors never move what
   // they hold, and the room not used is never touched.
   st.survey.points.reserve(st.workingLines);
+  st.survey.stations.reserve(st.stationRecords);
   st.survey.report.reserve(st.survey.report.size() + st.workingLines);
   Counters counters;
   WorkingCopy copy(st);

@@ -140,27 +140,6 @@ TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
   EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
 }
 
-// A refused file leaves the file box empty with the focus in it; a book of
-// control points only stops the run, which writes nothing.
-TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
-  const fs::path folder = FreshFolder();
-  RecordingHost host;
-  WriteBytes(folder / "empty.asc", "");
-  RunState empty = StateFor(folder / "empty.asc");
-  host.fileBox = "typed";
-  EXPECT_EQ(tinh_Click(empty, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(),
-            std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
-  EXPECT_EQ(host.fileBox, "");
-  EXPECT_EQ(host.focused, 1);
-
-  WriteBytes(folder / "kc.asc", "TR A 1 2 3\r\n\r\n   \r\n");
-  RunState onlyControl = StateFor(folder / "kc.asc");
-  EXPECT_EQ(tinh_Click(onlyControl, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), msg::kNoDetailData);
-  EXPECT_FALSE(fs::exists(folder / "kc.err"));
-}
-
 TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
   const fs::path folder = FreshFolder();
   WriteBytes(folder / "job.asc",
@@ -173,42 +152,6 @@ TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
   st.txtFKC = "  " + (folder / "common.kc").string() + " ";
   EXPECT_EQ(tinh_Click(st, host).outcome, RunOutcome::Completed);
   EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
-
-  RunState unnamed = StateFor(folder / "job.asc");
-  unnamed.ckKC = 1;
-  unnamed.txtFKC = "   ";
-  EXPECT_EQ(tinh_Click(unnamed, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), msg::kNoControlFile);
-
-  RunState unreadable = StateFor(folder / "job.asc");
-  unreadable.ckKC = 1;
-  unreadable.txtFKC = (folder / "gone.kc").string();
-  EXPECT_EQ(tinh_Click(unreadable, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kCannotOpen) + (folder / "gone.kc").string());
-}
-
-// Whatever the bytes, the run ends with its summary.
-TEST(Run, HostileBytesEndWithASummary) {
-  const fs::path folder = FreshFolder();
-  const std::string head = "TR A 1000 1000 10\nTR B 900 1000 12\rTR A 1.5\r\nDKD B\n";
-  std::string binary;
-  for (int i = 0; i < 4096; ++i) binary += static_cast<char>((i * 131 + 7) % 256);
-  const std::string cases[] = {
-      head + "1 900000 100 900000 1.5",                              // no final line end
-      head + std::string("1 9\0 100 900000 1.5\r\n", 21),            // NUL inside a number
-      head + "2 0 1 90 1 " + std::string(10'000'000, 'x') + "\r\n",  // a 10 MB word
-      head + binary,                                                 // binary data
-      head + "\xa7\x81\xff 0 1 900000 1 \x80\r\n1e999 1e999 1e999 1e999 1e999\r\n",
-      head + "TR 1e308 1e308 1e308 1e308\r\nTR 1e308 1.5\r\nDKD B\r\n3 1e300 1e300 1e300 1\r\n",
-  };
-  RecordingHost host;
-  for (const std::string& bytes : cases) {
-    WriteBytes(folder / "job.asc", bytes);
-    RunState st = StateFor(folder / "job.asc");
-    st.fasc = st.ftd = st.fkc = 1;
-    const RunResult result = tinh_Click(st, host);
-    EXPECT_EQ(result.outcome, RunOutcome::Completed) << bytes.substr(0, 80);
-  }
 }
 
 }  // namespace

@@ -6,7 +6,6 @@
 
 #include "core/angles.h"
 #include "core/lines.h"
-#include "core/paths.h"
 #include "tests/support.h"
 
 namespace kavu {
@@ -65,9 +64,7 @@ TEST(Angles, TextFormsRoundTheHalfSecondToEven) {
   EXPECT_EQ(GocStringText(5 + 59 / 60.0 + 59.5 / 3600), "   6 00 00");  // 60" then 60'
 
   EXPECT_EQ(GocSt(359.99999), "    00000");
-  EXPECT_EQ(GocSt(123.7584722), "  1234530");
   EXPECT_EQ(GocSt(-12.5), "  -123000");
-  EXPECT_EQ(GocSt(5.0691666667), "    50409");
   EXPECT_EQ(GocSt1(5.0691666667), "  5 04 09");
   EXPECT_EQ(GocSt1(-123.7584722), "-123 45 30");  // 10 characters, not cut
 }
@@ -110,24 +107,6 @@ TEST(Lines, TextOutWritesCrLfAndReportsFailure) {
   EXPECT_FALSE(bad.ok());
   bad.Line("swallowed");
   EXPECT_FALSE(bad.close());
-}
-
-// Paths are UTF-8 text: a folder and a file with Vietnamese letters are
-// written, read and listed under the same names.
-TEST(Lines, Utf8PathsRoundTrip) {
-  const std::string dir = Utf8FromPath(std::filesystem::temp_directory_path()) + "/kavu_Khảo sát";
-  const std::string file = dir + "/Đồng Tâm.asc";
-  std::filesystem::create_directories(PathFromUtf8(dir));
-  TextOut out(file);
-  out.Line("TR");
-  EXPECT_TRUE(out.close());
-  EXPECT_EQ(ReadFileBytes(file), std::optional<std::string>("TR\r\n"));
-  std::vector<std::string> names;
-  for (const auto& entry : std::filesystem::directory_iterator(PathFromUtf8(dir))) {
-    names.push_back(Utf8FromPath(entry.path().filename()));
-  }
-  EXPECT_EQ(names, std::vector<std::string>{"Đồng Tâm.asc"});
-  std::filesystem::remove_all(PathFromUtf8(dir));
 }
 
 }  // namespace

@@ -2,12 +2,10 @@
 // on the screen and in the pictures, a click showing the error lines and the
 // record; the exports read back; the field sketch on pages and in a PDF.
 #include <QCheckBox>
-#include <QFontInfo>
 #include <QImage>
 #include <QPainter>
 #include <QProcess>
 #include <QPushButton>
-#include <QRawFont>
 #include <QStandardPaths>
 #include <QSvgRenderer>
 #include <QtTest>
@@ -145,6 +143,8 @@ class MapTest : public QObject {
     QVERIFY(std::abs(after.y() - before.y() + 10) < 1e-6);
   }
 
+  // The view as PNG, the whole survey as PNG and SVG, red where the report
+  // points; a folder that is not there is refused.
   void exportsReadBack() {
     QTemporaryDir dir;
     MapWindow map;
@@ -155,17 +155,12 @@ class MapTest : public QObject {
     const QString png = dir.filePath(QStringLiteral("view.png"));
     const QString whole = dir.filePath(QStringLiteral("whole.png"));
     const QString svg = dir.filePath(QStringLiteral("whole.svg"));
-    QVERIFY(map.savePicture(png, false));
-    QVERIFY(map.savePicture(whole, true));
-    QVERIFY(map.savePicture(svg, true));
+    QVERIFY(map.savePicture(png, false) && map.savePicture(whole, true) &&
+            map.savePicture(svg, true));
     QCOMPARE(QImage(png).size(), map.canvas().size());
-    const QImage image(whole);
-    QCOMPARE(image.size(), kWholeSurveySize);
     const MapView view = FitView(map.canvas().model(), kWholeSurveySize);
-    QVERIFY(Red(PixelAt(image, view.toDevice(1020, 1990))));
-    QSvgRenderer renderer(svg);
-    QVERIFY(renderer.isValid());
-    QCOMPARE(renderer.viewBoxF(), QRectF(QPointF(0, 0), QSizeF(kWholeSurveySize)));
+    QVERIFY(Red(PixelAt(QImage(whole), view.toDevice(1020, 1990))));
+    QCOMPARE(QSvgRenderer(svg).viewBoxF(), QRectF(QPointF(0, 0), QSizeF(kWholeSurveySize)));
     QVERIFY(QString::fromUtf8(ReadAll(svg)).contains(QStringLiteral("CPđ")));
     QVERIFY(!map.savePicture(dir.filePath(QStringLiteral("no/such/folder/x.png")), true));
   }
@@ -194,19 +189,6 @@ class MapTest : public QObject {
     QCOMPARE(pages[1].back(), QString(77, QLatin1Char('=')));
     QVERIFY(pages[2][0].startsWith(QStringLiteral("Lược đồ số:")));
     QVERIFY(pages[2][2].endsWith(QStringLiteral("DC02")));
-  }
-
-  // The sketch's font is there and draws every letter of TCVN3 itself, so
-  // that no letter comes from another font of another width.
-  void theSketchFontHasEveryVietnameseLetter() {
-    const QFont font(QString::fromLatin1(kSketchFont));
-    QCOMPARE(QFontInfo(font).family(), QString::fromLatin1(kSketchFont));
-    const QRawFont raw = QRawFont::fromFont(font);
-    std::string bytes;
-    for (int b = 0x80; b <= 0xFF; ++b) bytes += static_cast<char>(b);
-    for (const QChar c : QString::fromStdString(Tcvn3ToUtf8(bytes))) {
-      if (c.isLetter()) QVERIFY2(raw.supportsCharacter(c), qPrintable(QString(c)));
-    }
   }
 
   // The README's example computed from the main window with the map ticked:
@@ -287,17 +269,6 @@ class MapTest : public QObject {
     QVERIFY(map.describe(two).contains(QStringLiteral("nhap sai phan phut")));
     QVERIFY2(map.describe(two).contains(QStringLiteral("2 1807500 25.000 0900000 1.50 N")),
              qPrintable(map.describe(two)));
-  }
-
-  void theOpenAfterARunBoxIsKept() {
-    {
-      Desk desk;
-      Child<QCheckBox>(desk.w, "ckBando")->setChecked(true);
-      desk.w.close();
-    }
-    QCOMPARE(Stored("KAVU_OpenMap"), QStringLiteral("1"));
-    Desk again;
-    QVERIFY(Child<QCheckBox>(again.w, "ckBando")->isChecked());
   }
 };
 
