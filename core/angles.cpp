@@ -18,7 +18,10 @@ AngleParts DecomposeAngle(double degrees) {
   AngleParts parts;
   // Whole minutes, reduced mod 60 after rounding to even like every integer
   // remainder of the field book arithmetic.
-  double phut = std::fmod(RoundEvenWhole(minutes_in_seconds / 60), 60.0);
+  const double minutes = RoundEvenWhole(minutes_in_seconds / 60);
+  double phut = std::fabs(minutes) < 9007199254740992.0
+                    ? static_cast<double>(static_cast<std::int64_t>(minutes) % 60)
+                    : std::fmod(minutes, 60.0);
   if (!std::isfinite(phut)) phut = 0;
   parts.phut = static_cast<std::int16_t>(phut);
   parts.do1 = Fix(minutes_in_seconds / 3600);

@@ -133,11 +133,6 @@ std::filesystem::path TempPathOf(const std::filesystem::path& path) {
   return temp;
 }
 
-namespace {
-// The text written to the file at a time.
-constexpr std::size_t kBlock = 1 << 20;
-}  // namespace
-
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
 
 TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
@@ -185,7 +180,6 @@ bool TextOut::open(const std::filesystem::path& path) {
 }
 
 bool TextOut::ok() const { return file_ != nullptr && !failed_; }
-
 
 bool TextOut::Drain() {
   if (!buffer_.empty() && ok() &&

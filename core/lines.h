@@ -80,6 +80,10 @@ class TextOut {
   // EndLine ends it with CR LF.
   std::string& Buffer() { return buffer_; }
   void EndLine();
+  // Writes the text waiting once it fills a block.
+  void WriteFull() {
+    if (buffer_.size() >= kBlock) Drain();
+  }
   // Writes what waits, flushes the file to the disk and closes it; false when
   // that failed. The file is put in place by commit.
   bool finish();
@@ -97,6 +101,7 @@ class TextOut {
   };
   std::unique_ptr<std::FILE, Closer> file_;
   // Written to the file a block at a time.
+  static constexpr std::size_t kBlock = 1 << 20;
   bool Drain();
   std::string buffer_;
   std::filesystem::path path_;

@@ -290,7 +290,7 @@ void AppendMask(std::string& out, double x, const NumberMask& mask) {
     out += Mask(x, mask.text);
     return;
   }
-  const double whole = std::round(y);  // half away from zero
+  const double whole = std::round(y);  // ties away from zero, as Mask rounds
   // The digits of the whole number, right-aligned, with zeros in front up to
   // one integer digit and up to the mask's integer zeros.
   char digits[kDigits];

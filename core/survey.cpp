@@ -43,16 +43,25 @@ std::uint64_t Survey::Keep(std::string_view text) {
 }
 
 Survey::PointTexts Survey::Texts(const ComputedPoint& point) const {
+  // The record's first fields, in one pass up to its line end.
+  const std::string_view rest = Text(point.record, std::string_view::npos);
   std::array<std::string_view, 7> f;
-  RecordFields(Record(point), f);
+  std::size_t count = 0;
+  std::size_t start = 0;
+  std::size_t end = 0;
+  for (; end < rest.size() && rest[end] != '\r' && rest[end] != '\n'; ++end) {
+    if (rest[end] != ' ') continue;
+    if (count < f.size()) f[count] = rest.substr(start, end - start);
+    ++count;
+    start = end + 1;
+  }
+  if (end > 0 && count < f.size()) f[count] = rest.substr(start, end - start);
   const bool peg = point.kind == PointKind::Peg;
   return {(peg ? f[5] : f[0]).substr(0, kNameWidth), point.words ? f[5] : std::string_view(),
-          point.words || peg ? f[6] : std::string_view()};
+          point.words || peg ? f[6] : std::string_view(), f[4]};
 }
 
-double Survey::Prism(const ComputedPoint& point) const {
-  return Val(RecordField(Record(point), 4));
-}
+double Survey::Prism(const ComputedPoint& point) const { return Val(Texts(point).prism); }
 
 void Survey::AppendText(std::string& out, const ReportEntry& entry) const {
   const std::string_view name = Point(entry);

@@ -116,6 +116,7 @@ struct Survey {
   // A point's name, code and note within its record line, found at once.
   struct PointTexts {
     std::string_view name, code, note;
+    std::string_view prism;  // the prism height as its record gives it
   };
   PointTexts Texts(const ComputedPoint& point) const;
   std::string_view Name(const ComputedPoint& point) const { return Texts(point).name; }

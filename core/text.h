@@ -86,13 +86,16 @@ template <std::size_t N>
 std::size_t RecordFields(std::string_view record, std::array<std::string_view, N>& fields) {
   fields = {};
   std::size_t count = 0;
-  for (std::size_t start = 0; !record.empty() && start <= record.size(); ++count) {
-    const std::size_t space = record.find(' ', start);
-    const std::size_t end = space == std::string_view::npos ? record.size() : space;
-    if (count < N) fields[count] = record.substr(start, end - start);
-    start = end + 1;
+  if (record.empty()) return 0;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < record.size(); ++i) {
+    if (record[i] != ' ') continue;
+    if (count < N) fields[count] = record.substr(start, i - start);
+    ++count;
+    start = i + 1;
   }
-  return count;
+  if (count < N) fields[count] = record.substr(start);
+  return count + 1;
 }
 
 }  // namespace kavu

@@ -33,16 +33,17 @@ Position RoundedPosition(const ComputedPoint& point) {
 // makes a reader keep only the last of them.
 class EntityWriter {
  public:
-  explicit EntityWriter(TextOut& out) : out_(out) {}
+  explicit EntityWriter(TextOut& out) : out_(out), text_(out.Buffer()) {}
 
   void Pair(std::string_view code, std::string_view value) {
-    out_.Line(code);
-    out_.Line(value);
+    text_.append(code).append("\r\n").append(value).append("\r\n");
+    out_.WriteFull();
   }
   void Pair(std::string_view code, double value) {
-    out_.Line(code);
-    AppendReportNumber(out_.Buffer(), value);
-    out_.EndLine();
+    text_.append(code).append("\r\n");
+    AppendReportNumber(text_, value);
+    text_.append("\r\n");
+    out_.WriteFull();
   }
 
   void Point(std::string_view layer, const Position& p, bool controlPoint) {
@@ -54,7 +55,7 @@ class EntityWriter {
   }
 
   // The label sits half a label height north and east of its point.
-  void Label(const Position& p, double offset, double height, std::string_view name,
+  void Label(const Position& p, double offset, std::string_view height, std::string_view name,
              bool controlPoint) {
     const double lx = RoundEven(p.x + offset, 3);
     const double ly = RoundEven(p.y + offset, 3);
@@ -76,6 +77,7 @@ class EntityWriter {
 
  private:
   TextOut& out_;
+  std::string& text_;
 };
 
 }  // namespace
@@ -84,6 +86,8 @@ void WriteDrawing(TextOut& out, const RunState& st) {
   // Label height on the ground: millimetres on paper times the scale.
   double h = Val(st.Htext) * Val(st.Tyle) / 1000;
   if (!std::isfinite(h) || !std::isfinite(1.5 * h)) h = 0;
+  const std::string controlHeight = ReportNumber(1.5 * h);
+  const std::string detailHeight = ReportNumber(h);
 
   EntityWriter dxf(out);
   dxf.Pair(" 0", "SECTION");
@@ -94,12 +98,12 @@ void WriteDrawing(TextOut& out, const RunState& st) {
   }
   for (const KnownPoint& point : st.MangKhongChe) {
     const Position p = RoundedPosition(point[1], point[2]);
-    dxf.Label(p, h / 2, 1.5 * h, TrimView(point[0]), true);
+    dxf.Label(p, h / 2, controlHeight, TrimView(point[0]), true);
   }
   for (const ComputedPoint& point : st.survey.points) {
     if (point.kind != PointKind::Detail) continue;
     const Position p = RoundedPosition(point);
-    dxf.Label(p, h / 2, h, st.survey.Name(point), false);
+    dxf.Label(p, h / 2, detailHeight, st.survey.Name(point), false);
     dxf.Point("DIEM", p, false);
   }
 

@@ -37,22 +37,24 @@ std::string OrientationDistanceText(double distance) {
 void WriteStationListing(TextOut& out, const Survey& survey) {
   // The first and last detail point of each station.
   struct Ends {
-    std::string_view first, last;
-    bool any = false;
+    const ComputedPoint* first = nullptr;
+    const ComputedPoint* last = nullptr;
   };
   std::vector<Ends> ends(survey.stations.size());
   for (const ComputedPoint& point : survey.points) {
     if (point.kind != PointKind::Detail) continue;
     Ends& e = ends[point.station];
-    if (!e.any) e.first = survey.Name(point);
-    e.last = survey.Name(point);
-    e.any = true;
+    if (e.first == nullptr) e.first = &point;
+    e.last = &point;
   }
+  const auto name = [&](const ComputedPoint* point) {
+    return FixedWidth(point != nullptr ? survey.Name(*point) : std::string_view(), 5);
+  };
   for (std::size_t i = 0; i < survey.stations.size(); ++i) {
     const StationResult& s = survey.stations[i];
     out.Line(FixedWidth(s.station.name, 12) + FixedWidth(s.orientation.name, 12) + " " +
              GocStringText(s.backBearing) + " " + OrientationDistanceText(s.orientationDistance) +
-             "    " + FixedWidth(ends[i].first, 5) + " -  " + FixedWidth(ends[i].last, 5));
+             "    " + name(ends[i].first) + " -  " + name(ends[i].last));
   }
 }
 
@@ -115,7 +117,7 @@ void AppendCoordinateListingLine(std::string& out, const Survey& survey, const C
   AppendColumn(out, p.x, kNorthingMask, 12);
   AppendColumn(out, p.y, kEastingMask, 12);
   AppendColumn(out, p.z, kHeightMask, 12);
-  AppendColumn(out, survey.Prism(p), kPrismMask, 10);
+  AppendColumn(out, Val(texts.prism), kPrismMask, 10);
   for (const std::string_view words : {texts.code, texts.note}) {
     if (!words.empty()) out.append(" ").append(words);
   }

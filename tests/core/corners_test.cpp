@@ -116,18 +116,6 @@ TEST(Corners, EntryChecksOfAnglesAndDistances) {
   }
 }
 
-// A station whose orientation point lies more than 10 km away is reported;
-// exactly 10 km is not.
-TEST(Corners, CoordinatesMoreThanTenKilometresApart) {
-  for (const auto& [x, reported] : {std::pair{"11000", false}, std::pair{"11000.5", true}}) {
-    const Outcome run = Compute(std::string("TR KC1 1000 1000 10\r\nTR F ") + x +
-                                " 1000 10\r\nTR KC1 1.5\r\nDKD F\r\n1 0 10 900000 1.5\r\n");
-    const bool found = run.Product(".err").find(
-                           "Diem: KC1          hoac F            SAI TOA DO!") != std::string::npos;
-    EXPECT_EQ(found, reported) << x;
-  }
-}
-
 // The check record on KC3. Orientation azimuth (KC2 to KC1) 0; azimuth from
 // KC3 to KC1 is 270, so the check reading should be 270 - 0. With the
 // orientation on KC3 instead (azimuth 270) and the check on KC2 (azimuth 0),

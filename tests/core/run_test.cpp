@@ -140,19 +140,5 @@ TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
   EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
 }
 
-TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
-  const fs::path folder = FreshFolder();
-  WriteBytes(folder / "job.asc",
-             "TR A 5 5 5\r\nTR B 6 6 6\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "common.kc", "header line\r\nTR A 1000 1000 10\r\nTR B 900 1000\r\n");
-  RecordingHost host;
-
-  RunState st = StateFor(folder / "job.asc");
-  st.ckKC = 1;
-  st.txtFKC = "  " + (folder / "common.kc").string() + " ";
-  EXPECT_EQ(tinh_Click(st, host).outcome, RunOutcome::Completed);
-  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
-}
-
 }  // namespace
 }  // namespace kavu

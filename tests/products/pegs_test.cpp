@@ -2,9 +2,7 @@
 
 #include <gtest/gtest.h>
 
-#include "core/host.h"
 #include "core/station.h"
-#include "run/run.h"
 #include "tests/products/product_files.h"
 
 namespace kavu {
@@ -89,85 +87,6 @@ TEST(Pegs, HeadAndStationBlocks) {
   ASSERT_EQ(st.survey.report.size(), 2u);
   EXPECT_EQ(st.survey.TextOf(st.survey.report[0]), "Diem M7           nhap sai phan do");
   EXPECT_EQ(st.survey.TextOf(st.survey.report[1]), "Diem M9           nhap sai phan do");
-}
-
-TEST(Pegs, HeadWithoutHeights) {
-  const auto folder = FreshFolder();
-  RunState st = PegState(folder, 1, 0);
-  WritePegFileHead(st);
-  ASSERT_TRUE(st.cpFile.close());
-  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/head_without_heights.cp"));
-}
-
-// Without the box ticked nothing is written and nothing is checked.
-TEST(Pegs, NothingWhenNotTicked) {
-  const auto folder = FreshFolder();
-  RunState st = PegState(folder, 0, 1);
-  WritePegFileHead(st);
-  Station(st, "ST1", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
-  ASSERT_TRUE(st.cpFile.close());
-  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), "");
-  EXPECT_EQ(st.err, 0);
-}
-
-RunState RunOn(const std::filesystem::path& fieldBook) {
-  RunState st;
-  st.txtfile = fieldBook.string();
-  st.ftd = 0;
-  st.fdc = 1;
-  st.fcp = 1;
-  st.seed = 1;
-  return st;
-}
-
-// The peg file of one run serves the next: as a field book its head gives the
-// known points and its station blocks give each peg again as a detail point,
-// at the coordinates the peg got.
-TEST(Pegs, PegFileIsReadBackByTheNextRun) {
-  const auto folder = FreshFolder();
-  const auto book = folder / "JOB1.asc";
-  testing::WriteBytes(book,
-                      "TR ST1 2345678.123 567890.456 12.5\r\n"
-                      "TR DH1 2345578.123 567890.456 10.0\r\n"
-                      "TR ST1 1.45\r\n"
-                      "DKD DH1\r\n"
-                      "1 1234530 45.6 900000 1.5\r\n"
-                      "2 2700000 30.25 900000 1.5 CP5\r\n"
-                      "TR CP5 1.5\r\n"
-                      "DKD ST1\r\n"
-                      "3 1800000 20 900000 1.5\r\n");
-  QuietHost host;
-  RunState first = RunOn(book);
-  const RunResult firstRun = tinh_Click(first, host);
-  ASSERT_EQ(firstRun.outcome, RunOutcome::Completed);
-  ASSERT_EQ(first.err, 0);
-  ASSERT_EQ(first.sdkc(), 3);  // ST1, DH1 and the peg CP5
-  const KnownPoint peg = first.MangKhongChe[2];
-  ASSERT_EQ(Trim(peg[0]), "CP5");
-  const std::string cp = FileBytes(folder / "JOB1.cp");
-  EXPECT_EQ(cp,
-            "TR ST1          2345678.123 567890.456 12.5      \r\n"
-            "TR DH1          2345578.123 567890.456 10.0      \r\n"
-            "TR ST1         \r\n"
-            "DKD1 DH1         \r\n"
-            " CP5          2700000   30.25  900000 1.5 \r\n");
-
-  // As a field book: the peg comes back as a detail point at its place. The
-  // block's station line carries no instrument height, which the run reports,
-  // so the height comes out lower by the 1.45 m of the first run.
-  const auto asBook = folder / "JOB3.asc";
-  testing::WriteBytes(asBook, cp);
-  RunState third = RunOn(asBook);
-  const RunResult thirdRun = tinh_Click(third, host);
-  ASSERT_EQ(thirdRun.outcome, RunOutcome::Completed);
-  EXPECT_EQ(third.err, 1);
-  ASSERT_EQ(thirdRun.survey.points.size(), 1u);
-  const ComputedPoint& point = thirdRun.survey.points[0];
-  EXPECT_EQ(thirdRun.survey.Name(point), "CP5");
-  EXPECT_EQ(NorthingText(point.x), Trim(peg[1]));
-  EXPECT_EQ(EastingText(point.y), Trim(peg[2]));
-  EXPECT_EQ(HeightText(point.z), "11.000");
-  EXPECT_EQ(peg[3], "12.450    ");
 }
 
 }  // namespace
