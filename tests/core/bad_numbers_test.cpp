@@ -33,7 +33,6 @@ struct Case {
   std::vector<std::string> present;  // texts some product holds
   std::vector<std::string> absent;   // texts no product holds
   int fdc = 1;
-  std::string common = {};  // the common control file, when one is used
 };
 
 std::string Name(const char* name) { return FixedWidth(name, 12); }
@@ -89,6 +88,17 @@ const Case kCases[] = {
      {},
      {"TR " + Name("1003") + "1000", "TR " + Name("3") + "900"},
      {}},
+    // An orientation point up to 10 km away is no error; beyond, reported.
+    {"orientation 10 km away",
+     "TR KC1 1000 1000 10\r\nTR F 11000 1000 10\r\nTR KC1 1.5\r\nDKD F\r\n" + kGood,
+     {},
+     {"OK1"},
+     {}},
+    {"orientation beyond 10 km",
+     "TR KC1 1000 1000 10\r\nTR F 11000.5 1000 10\r\nTR KC1 1.5\r\nDKD F\r\n" + kGood,
+     {"Diem: KC1          hoac F            SAI TOA DO!"},
+     {"OK1"},
+     {}},
     {"coordinates wider than their columns",
      "TR W1 12345678901.500 1000 12345678.5\r\nTR W2 12345678801.500 1000 12\r\n"
      "TR W1 1.5\r\nDKD W2\r\nOK1 1800000 10 900000 1.5\r\n",
@@ -118,11 +128,6 @@ TEST(BadNumbers, AreReportedOnceAndKeptOutOfEveryProduct) {
     st.seed = 7;
     st.fasc = st.ftd = st.fkc = st.fcp = st.fsdo = 1;
     st.fdc = c.fdc;
-    if (!c.common.empty()) {
-      WriteBytes(folder / "common.kc", c.common);
-      st.ckKC = 1;
-      st.txtFKC = (folder / "common.kc").string();
-    }
     RecordingHost host;
     const RunResult result = tinh_Click(st, host);
     ASSERT_EQ(result.outcome, RunOutcome::Completed);

@@ -3,6 +3,7 @@
 // worked out by hand from the rule, not taken from a run.
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <filesystem>
 #include <regex>
 #include <sstream>
@@ -12,6 +13,7 @@
 
 #include "cli/cli.h"
 #include "core/messages.h"
+#include "core/station.h"
 #include "core/tcvn3.h"
 #include "tests/support.h"
 
@@ -97,6 +99,7 @@ TEST(Corners, BooksAndWhatTheirProductsShow) {
       {{"--scale", "5000"}, measured("97.5"), ds("-2.5 ")},
       {{}, "S 1234560 10 900000 1.5\r\n", "\r\nDiem S            nhap sai phan giay\r\n"},
       {{}, "S 1234559.9 10 900000 1.5\r\n", ""},
+      {{}, "S 1234599.6 10 900000 1.5\r\n", ""},  // -0.4 seconds carried into 46 minutes
       {{}, "S 1236000 10 900000 1.5\r\n", "\r\nDiem S            nhap sai phan phut\r\n"},
       {{}, "S 0 10 0895960 1.5\r\n", "\r\nDiem S            nhap sai phan giay\r\n"},
       {{}, "S 0 2000 900000 1.5\r\n", ""},
@@ -132,6 +135,27 @@ TEST(Corners, BooksAndWhatTheirProductsShow) {
       EXPECT_NE(run.Product(product).find(text), std::string::npos) << product << " " << text;
     }
   }
+}
+
+// The azimuth is held in single precision, so exact quarter turns come out a
+// few millionths of a degree off, as the office's products always showed.
+TEST(Corners, SinglePrecisionAzimuthsAndDistance) {
+  RunState st;
+  st.xTR = st.yTR = 1000;
+  for (const auto& [x, y, azimuth] :
+       {std::tuple{900.0, 1000.0, 0.0}, std::tuple{1000.0, 900.0, 90.0000025},
+        std::tuple{1000.0, 1100.0, 270.0000007}, std::tuple{1100.0, 1000.0, 180.000005},
+        std::tuple{900.0, 900.0, 45.0000013}}) {
+    st.xDKD = x;
+    st.yDKD = y;
+    TinhPhuongViCanh(st);
+    EXPECT_NEAR(st.gpv, azimuth, 1e-7) << x << " " << y;
+  }
+  EXPECT_DOUBLE_EQ(st.cdh, 100 * std::sqrt(2.0));
+  // Radians from degrees with pi to 15 digits, as every angle of the book.
+  st.goc = 1800000;
+  gocdo(st);
+  EXPECT_EQ(st.rad, 3.14159265358979);
 }
 
 // The check record on KC3. Orientation azimuth (KC2 to KC1) 0; azimuth from

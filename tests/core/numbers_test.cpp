@@ -34,7 +34,8 @@ TEST(Val, ReadsTheNumericPrefixSkippingBlanks) {
       {std::string(400, '9'), 0, true},
       {" -0", 0, true},
       {".", 0, false},
-      {"-e5", 0, false}};
+      {"-e5", 0, false},
+      {"0.9007199254740993", 0.9007199254740993, true}};
   for (const auto& [text, value, digit] : cases) {
     EXPECT_EQ(Val(text), value) << text;
     EXPECT_EQ(HasNumber(text), digit) << text;
@@ -100,6 +101,8 @@ TEST(NumberText, FifteenDigitsAndNoLeadingZero) {
       {123456789012345678.0, "1.23456789012346E+17"},
       {-2345678.125, "-2345678.125"}};
   for (const auto& [x, text] : cases) EXPECT_EQ(NumberText(x), text) << x;
+  EXPECT_EQ(ReportNumber(-0.0), " 0 ");
+  EXPECT_EQ(ReportNumber(-0.12), "-.12 ");
 }
 
 // The in-place forms write exactly what the reference rules write: over a
