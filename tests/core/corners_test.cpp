@@ -186,5 +186,48 @@ TEST(Corners, CheckReadingKeptOrMadeUpWithinHalfAMinute) {
   }
 }
 
+// --kind overrides the extension; --text-height times the scale / 1000 is
+// the label height in the drawing file (4 mm at 1:500 is 2 m, and 3 m for
+// the control points' labels, half as high again).
+TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
+  const std::string book = Book("1 0 10 900000 1.5\r\n");
+  EXPECT_EQ(Compute(book, {"--kind", "0", "--txt"}, ".dat").code, kExitOk);
+  EXPECT_EQ(Compute(book, {"--txt"}, ".dat").code, kExitStopped);  // kind 9: job.asc needed
+  const Outcome other = Compute(book, {"--kind", "9"}, ".asc");
+  EXPECT_EQ(other.code, kExitOk);
+  const std::string dxf =
+      Compute(book, {"--dxf", "--text-height", "4", "--scale", "500"}).Product(".dxf");
+  EXPECT_NE(dxf.find(" 40\r\n 2 \r\n"), std::string::npos) << dxf;
+  EXPECT_NE(dxf.find(" 40\r\n 3 \r\n"), std::string::npos) << dxf;
+}
+
+// A .gre file is an SDR recording: converted with its set-ups, then
+// computed. Every number fills its columns up to the next one, so a column
+// boundary one off changes a value: slope 1234 at zenith 89.5 is 1233.953 m
+// horizontal (1234 x sin 89.5); the reading 45, turned to the backsight read
+// at 45.5, wraps to 359 30 00 and the backsight itself reads 0; the prism
+// height and the height are kept as recorded; a description of two
+// characters does not name a point, and a listed backsight keeps its name
+// whatever its observation's note says.
+TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
+  const std::string gre =
+      "08KI0001  1000.000  1000.0000000010.00          KC1\r\n"
+      "08KI0002   900.000  1000.0000000010.00          K2\r\n"
+      "02TP0001                                   1.500\r\n"
+      "07TP    0002\r\n"
+      "09F1    000200000001000090.000000000045.50MOC5\r\n"
+      "03NM000001.500\r\n"
+      "09F1    000300000012340089.500000000000045\r\n";
+  const Outcome run = Compute(gre, {"--txt"}, ".gre");
+  EXPECT_EQ(run.code, kExitOk);
+  EXPECT_EQ(run.Product(".asc"),
+            "TR KC1    1000.000    1000.000 0000010.00\r\n"
+            "TR DKC0002     900.000    1000.000 0000010.00\r\n"
+            "TR KC1 1.500\r\n"
+            "DKD DKC0002\r\n"
+            "DKC0002    00000  100.000   900000    0.0 DKC0002\r\n"
+            "3     3593000 1233.953   893000 000001.500 \r\n");
+}
+
 }  // namespace
 }  // namespace kavu

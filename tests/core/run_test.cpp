@@ -123,22 +123,5 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
 
-TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
-  const fs::path folder = FreshFolder();
-  WriteBytes(
-      folder / "job.asc",
-      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "job.bak", "old\r\n");
-  RunState st = StateFor(folder / "job.asc");
-  RecordingHost host;
-  const RunResult result = tinh_Click(st, host);
-  EXPECT_EQ(result.outcome, RunOutcome::Completed);
-  EXPECT_EQ(result.err, 0);
-  for (const char* name : {"job.err", "job.cpv", "job.bak"}) {
-    EXPECT_FALSE(fs::exists(folder / name)) << name;
-  }
-  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
-}
-
 }  // namespace
 }  // namespace kavu
