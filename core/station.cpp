@@ -135,7 +135,7 @@ void NotePoint(RunState& st, PointKind kind, bool words, bool listed) {
   point.record = Place(st, st.dong) & ((std::uint64_t{1} << 61) - 1);
   point.line = static_cast<std::uint32_t>(st.line);
   point.station = static_cast<std::uint32_t>(st.survey.stations.size() - 1);
-  point.kind = kind;
+  point.SetKind(kind);
   point.listed = listed;
   point.words = words;
   st.survey.points.push_back(point);

@@ -56,7 +56,7 @@ Survey::PointTexts Survey::Texts(const ComputedPoint& point) const {
     start = end + 1;
   }
   if (end > 0 && count < f.size()) f[count] = rest.substr(start, end - start);
-  const bool peg = point.kind == PointKind::Peg;
+  const bool peg = point.kind() == PointKind::Peg;
   return {(peg ? f[5] : f[0]).substr(0, kNameWidth), point.words ? f[5] : std::string_view(),
           point.words || peg ? f[6] : std::string_view(), f[4]};
 }
@@ -86,7 +86,7 @@ std::string Survey::TextOf(const ReportEntry& entry) const {
 ComputedPoint& Survey::AddPoint(std::string_view record, PointKind kind, double x, double y) {
   ComputedPoint point;
   point.record = KeepRecord(record);
-  point.kind = kind;
+  point.SetKind(kind);
   point.x = x;
   point.y = y;
   points.push_back(point);

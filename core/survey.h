@@ -61,16 +61,21 @@ struct ComputedPoint {
   double z = 0;  // the height as computed, unrounded (also with heights off)
   // Where its record line stands in the survey's texts, fields set off by
   // single spaces, up to the line end that follows it there.
+  // (The bit fields share one type, so that every compiler packs them into
+  // one word.)
   std::uint64_t record : 61 = 0;
-  PointKind kind : 1 = PointKind::Detail;
+  std::uint64_t peg : 1 = 0;
   // Whether the coordinate listing (.td1) gives it a line: a detail point
   // whose record has no words after the prism height, or descriptive words.
-  bool listed : 1 = false;
+  std::uint64_t listed : 1 = 0;
   // A detail point whose sixth field is descriptive words: its code, and its
   // note after them.
-  bool words : 1 = false;
+  std::uint64_t words : 1 = 0;
   std::uint32_t line = 0;     // field-book line of its record (from 1)
   std::uint32_t station = 0;  // index into Survey::stations
+
+  PointKind kind() const { return peg != 0 ? PointKind::Peg : PointKind::Detail; }
+  void SetKind(PointKind kind) { peg = kind == PointKind::Peg ? 1 : 0; }
 };
 
 // A line of the control-point listing that heads the .kc, the TRIDO book and

@@ -101,7 +101,7 @@ void WriteDrawing(TextOut& out, const RunState& st) {
     dxf.Label(p, h / 2, controlHeight, TrimView(point[0]), true);
   }
   for (const ComputedPoint& point : st.survey.points) {
-    if (point.kind != PointKind::Detail) continue;
+    if (point.kind() != PointKind::Detail) continue;
     const Position p = RoundedPosition(point);
     dxf.Label(p, h / 2, detailHeight, st.survey.Name(point), false);
     dxf.Point("DIEM", p, false);

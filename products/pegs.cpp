@@ -40,7 +40,7 @@ void CheckPegReadings(RunState& st, std::size_t firstPoint) {
   if (!Ticked(st.fcp)) return;
   for (std::size_t i = firstPoint; i < st.survey.points.size(); ++i) {
     const ComputedPoint& point = st.survey.points[i];
-    if (point.kind != PointKind::Peg) continue;
+    if (point.kind() != PointKind::Peg) continue;
     const std::string_view record = st.survey.Record(point);
     if (ReadingTooLong(RecordField(record, 1))) {
       ReportPoint(st, RecordField(record, 5).substr(0, 12), msg::kWrongDegrees);
@@ -53,7 +53,7 @@ void WritePegBlocks(TextOut& out, const Survey& survey) {
   std::optional<std::size_t> station;
   bool ended = false;
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind != PointKind::Peg) continue;
+    if (point.kind() != PointKind::Peg) continue;
     if (point.station != station) {
       station = point.station;
       ended = false;

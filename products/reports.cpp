@@ -42,7 +42,7 @@ void WriteStationListing(TextOut& out, const Survey& survey) {
   };
   std::vector<Ends> ends(survey.stations.size());
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind != PointKind::Detail) continue;
+    if (point.kind() != PointKind::Detail) continue;
     Ends& e = ends[point.station];
     if (e.first == nullptr) e.first = &point;
     e.last = &point;
@@ -102,7 +102,7 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
   std::string line =
       ControlLine(FixedWidth(entry.name, 12), NumberWidth(NorthingText(point.x), 11),
                   NumberWidth(EastingText(point.y), 10), entry.height ? &z : nullptr);
-  if (point.kind == PointKind::Peg && !survey.Note(point).empty()) {
+  if (point.kind() == PointKind::Peg && !survey.Note(point).empty()) {
     line += " ";
     line += survey.Note(point);
   }
@@ -163,7 +163,7 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
 
 void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals) {
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind != PointKind::Detail) continue;
+    if (point.kind() != PointKind::Detail) continue;
     AppendCoordinateTextLine(out.Buffer(), survey, point, decimals);
     out.EndLine();
   }

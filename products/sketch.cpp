@@ -115,7 +115,7 @@ void WriteStation(TextOut& out, const FormWords& w, const Survey& survey,
   out.Line(std::string(kFormWidth, '-'));
 
   for (const ComputedPoint& point : points) {
-    if (point.kind != PointKind::Detail) continue;
+    if (point.kind() != PointKind::Detail) continue;
     AppendDetailRow(out.Buffer(), survey, point);
     out.EndLine();
   }

@@ -77,7 +77,7 @@ class WorkingCopy {
     // A line that stands in the field book as it reads, up to its line end,
     // is not kept again.
     const std::string_view standing = TrimView(raw);
-    if (standing == st_.dong && standing.end() == raw.end()) {
+    if (standing == st_.dong && standing.data() + standing.size() == raw.data() + raw.size()) {
       st_.dongAt = static_cast<std::uint64_t>(standing.data() - st_.survey.book.data());
       st_.dongKept = true;
     }

@@ -115,7 +115,7 @@ MapModel BuildMap(const Survey& survey) {
   }
   for (std::size_t i = 0; i < survey.points.size(); ++i) {
     const ComputedPoint& p = survey.points[i];
-    add(p.kind == PointKind::Peg ? MapKind::Peg : MapKind::Detail, survey.Name(p), p.x, p.y, i,
+    add(p.kind() == PointKind::Peg ? MapKind::Peg : MapKind::Detail, survey.Name(p), p.x, p.y, i,
         p.line);
     model.items.back().code = FromTcvn3(survey.Code(p));
   }

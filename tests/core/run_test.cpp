@@ -96,7 +96,7 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   std::istringstream txt(FileBytes(kEveryRecord / "expected" / "job.txt"));
   std::size_t k = 0;
   for (std::string line; std::getline(txt, line); ++k) {
-    while (k < survey.points.size() && survey.points[k].kind != PointKind::Detail) ++k;
+    while (k < survey.points.size() && survey.points[k].kind() != PointKind::Detail) ++k;
     ASSERT_LT(k, survey.points.size()) << line;
     std::istringstream fields(line.substr(5));
     double x = 0, y = 0;
@@ -118,7 +118,7 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_TRUE(survey.stations[0].checkResidual);
   std::vector<std::string> pegs;
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind == PointKind::Peg) pegs.emplace_back(survey.Name(point));
+    if (point.kind() == PointKind::Peg) pegs.emplace_back(survey.Name(point));
   }
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
