@@ -425,6 +425,8 @@ RunResult tinh_Click(RunState& st, Host& host) {
   }
 
   // A run without errors leaves no error report and no station listing.
+  // The products' weights: their time a point as measured (sketch rows and
+  // drawing entities take the longest).
   const Survey& survey = st.survey;
   const std::size_t details = survey.points.size();
   std::vector<Product> products;
@@ -447,7 +449,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
     for (const bool coordinates : {false, true}) {
       products.push_back(NewProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1,
-                                    (coordinates ? 3 : 1) * details,
+                                    (coordinates ? 2 : 1) * details,
                                     [&, coordinates](TextOut& out) {
                                       WriteControlListing(out, survey);
                                       WriteStationRecords(out, survey, coordinates);
@@ -461,13 +463,13 @@ RunResult tinh_Click(RunState& st, Host& host) {
                    [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
   }
   if (Ticked(st.fdxf)) {
-    products.push_back(NewProduct(st, st.daufile + ".dxf", 5 * details,
+    products.push_back(NewProduct(st, st.daufile + ".dxf", 4 * details,
                                   [&](TextOut& out) { WriteDrawing(out, st); }));
   }
   products.push_back(KeptProduct(st.cpFile, survey.stations.size(), [&](TextOut& out) {
     if (Ticked(st.fcp)) WritePegBlocks(out, survey);
   }));
-  products.push_back(KeptProduct(st.sdoFile, 5 * details, [&](TextOut& out) {
+  products.push_back(KeptProduct(st.sdoFile, 6 * details, [&](TextOut& out) {
     if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
   }));
   WriteProducts(products);
