@@ -18,7 +18,10 @@ AngleParts DecomposeAngle(double degrees) {
   AngleParts parts;
   // Whole minutes, reduced mod 60 after rounding to even like every integer
   // remainder of the field book arithmetic.
-  double phut = std::fmod(RoundEvenWhole(minutes_in_seconds / 60), 60.0);
+  const double minutes = RoundEvenWhole(minutes_in_seconds / 60);
+  double phut = std::fabs(minutes) < 9007199254740992.0
+                    ? static_cast<double>(static_cast<std::int64_t>(minutes) % 60)
+                    : std::fmod(minutes, 60.0);
   if (!std::isfinite(phut)) phut = 0;
   parts.phut = static_cast<std::int16_t>(phut);
   parts.do1 = Fix(minutes_in_seconds / 3600);
@@ -36,38 +39,40 @@ AngleParts DecomposeAngle(double degrees) {
   return parts;
 }
 
-namespace {
-
-std::string AngleBody(double degrees, const char* separator, AngleParts* out) {
-  const AngleParts parts = DecomposeAngle(degrees);
-  if (out != nullptr) *out = parts;
-  std::string text = degrees < 0 ? "-" : "";
-  text += Mask(parts.do1, "##0");
-  text += separator;
-  text += Mask(parts.phut, "00");
-  text += separator;
-  text += Mask(parts.giay, "00");
-  return text;
+void AppendAngle(std::string& out, double degrees, std::string_view separator, std::size_t width,
+                 AngleParts* parts) {
+  static constexpr NumberMask kDegrees = ReadMask("##0");
+  static constexpr NumberMask kTwoDigits = ReadMask("00");
+  const AngleParts p = DecomposeAngle(degrees);
+  if (parts != nullptr) *parts = p;
+  const std::size_t from = out.size();
+  if (degrees < 0) out.push_back('-');
+  AppendMask(out, p.do1, kDegrees);
+  out.append(separator);
+  AppendMask(out, p.phut, kTwoDigits);
+  out.append(separator);
+  AppendMask(out, p.giay, kTwoDigits);
+  PadInFront(out, from, width);
 }
 
-std::string PadFront(std::string text, std::size_t width) {
-  if (text.size() < width) text.insert(0, width - text.size(), ' ');
+namespace {
+
+std::string AngleText(double degrees, std::string_view separator, std::size_t width,
+                      AngleParts* parts) {
+  std::string text;
+  AppendAngle(text, degrees, separator, width, parts);
   return text;
 }
 
 }  // namespace
 
 std::string GocStringText(double degrees, AngleParts* parts) {
-  return PadFront(AngleBody(degrees, " ", parts), 10);
+  return AngleText(degrees, " ", 10, parts);
 }
 
-std::string GocSt(double degrees, AngleParts* parts) {
-  return PadFront(AngleBody(degrees, "", parts), 9);
-}
+std::string GocSt(double degrees, AngleParts* parts) { return AngleText(degrees, "", 9, parts); }
 
-std::string GocSt1(double degrees, AngleParts* parts) {
-  return RString(AngleBody(degrees, " ", parts), 9);
-}
+std::string GocSt1(double degrees, AngleParts* parts) { return AngleText(degrees, " ", 9, parts); }
 
 double CvGocDbl(std::string_view packed) {
   const std::string t = Mask(Val(packed), "0000000");

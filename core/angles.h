@@ -29,6 +29,12 @@ std::string GocSt(double degrees, AngleParts* parts = nullptr);
 // '  5 04 09': D MM SS, RString to 9.
 std::string GocSt1(double degrees, AngleParts* parts = nullptr);
 
+// The angle's text appended to out: D, MM and SS set off by separator, "-" in
+// front of a negative angle, spaces in front up to width (GocStringText: " ",
+// 10; GocSt: "", 9; GocSt1: " ", 9).
+void AppendAngle(std::string& out, double degrees, std::string_view separator, std::size_t width,
+                 AngleParts* parts = nullptr);
+
 // Packed angle text to decimal degrees ('1234530' -> 123.758333...).
 double CvGocDbl(std::string_view packed);
 

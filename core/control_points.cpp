@@ -14,22 +14,31 @@ namespace {
 
 // One line as both passes read it: surrounding spaces removed, blank lines
 // skipped, the rest normalised and split. False for a blank line.
-bool ReadRecord(std::string_view raw, std::string& line, std::vector<std::string>& fields) {
+bool ReadRecord(std::string_view raw, std::string& line, std::vector<std::string_view>& fields) {
   line.assign(TrimView(raw));
   if (line.empty()) return false;
   SplitFields(line, fields);
   return true;
 }
 
-bool IsControlRecord(const std::vector<std::string>& fields) {
+bool IsControlRecord(const std::vector<std::string_view>& fields) {
   return fields.size() >= 4 && fields[0] == "TR";
 }
 
-void AddControlPoint(RunState& st, const std::vector<std::string>& fields) {
+void AddControlPoint(RunState& st, const std::vector<std::string_view>& fields) {
   ReportLongName(st, fields[1]);
   const bool withHeight = Ticked(st.fdc) && fields.size() >= 5;
-  st.MangKhongChe.push_back({fields[1], fields[2], fields[3], withHeight ? fields[4] : ""});
+  st.MangKhongChe.push_back({std::string(fields[1]), std::string(fields[2]), std::string(fields[3]),
+                             withHeight ? std::string(fields[4]) : std::string()});
 }
+
+}  // namespace
+
+bool WorkingLine(std::string_view raw, std::string& line, std::vector<std::string_view>& fields) {
+  return ReadRecord(raw, line, fields) && !IsControlRecord(fields);
+}
+
+namespace {
 
 // A record the station loop starts a station at.
 bool IsStationRecord(std::string_view line) {
@@ -41,10 +50,10 @@ bool IsStationRecord(std::string_view line) {
 bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
   const bool commonFile = Ticked(st.ckKC);
   std::string line;
-  std::vector<std::string> fields;
+  std::vector<std::string_view> fields;
   st.MangKhongChe.clear();
-  st.tamsl.clear();
-  st.tamslLine.clear();
+  st.workingLines = 0;
+  st.stationRecords = 0;
   if (commonFile) {
     const std::string path = Trim(st.txtFKC);
     if (path.empty()) {
@@ -76,29 +85,32 @@ bool DocFileKhongChe(RunState& st, Host& host, std::string_view fieldBook) {
   bool stationSeen = false;
   bool reachable = false;
   std::size_t number = 0;
+  std::size_t working = 0;
   LineReader reader(fieldBook);
   for (std::string_view raw; reader.Next(raw);) {
     ++number;
+    // Only a record that begins with TR can be a control or station record.
+    const std::string_view trimmed = TrimView(raw);
+    if (!trimmed.empty() && !trimmed.starts_with("TR")) {
+      ++working;
+      reachable = reachable || stationSeen;
+      continue;
+    }
     if (!ReadRecord(raw, line, fields)) continue;
     st.line = number;
     if (IsControlRecord(fields)) {
       // With a common file the field book's own control points are ignored.
       if (!commonFile) AddControlPoint(st, fields);
     } else {
+      ++working;
       reachable = reachable || stationSeen;
-      stationSeen = stationSeen || IsStationRecord(line);
+      const bool station = IsStationRecord(line);
+      st.stationRecords += station ? 1 : 0;
+      stationSeen = stationSeen || station;
     }
   }
   st.line = 0;
-  if (!reachable) return true;
-  number = 0;
-  reader = LineReader(fieldBook);
-  for (std::string_view raw; reader.Next(raw);) {
-    ++number;
-    if (!ReadRecord(raw, line, fields) || IsControlRecord(fields)) continue;
-    st.tamsl.push_back(line);
-    st.tamslLine.push_back(number);
-  }
+  if (reachable) st.workingLines = working;
   return true;
 }
 

@@ -1,9 +1,11 @@
 #include "core/lines.h"
 
+#include <cstring>
 #include <fstream>
 #include <ios>
 #include <iterator>
 #include <system_error>
+#include <utility>
 
 #ifdef _WIN32
 #ifndef NOMINMAX
@@ -32,8 +34,18 @@ namespace kavu {
 bool LineReader::Next(std::string_view& line) {
   if (next_ >= content_.size()) return false;
   const std::size_t start = next_;
-  const std::size_t end = content_.find_first_of("\r\n", start);
-  if (end == std::string_view::npos) {
+  // The line ends at the first CR or LF: the LF found first, then a CR
+  // before it.
+  const char* const from = content_.data() + start;
+  const std::size_t left = content_.size() - start;
+  const void* const lf = std::memchr(from, '\n', left);
+  const std::size_t toLf =
+      lf != nullptr ? static_cast<std::size_t>(static_cast<const char*>(lf) - from) : left;
+  const void* const cr = std::memchr(from, '\r', toLf);
+  const std::size_t end =
+      start +
+      (cr != nullptr ? static_cast<std::size_t>(static_cast<const char*>(cr) - from) : toLf);
+  if (end == content_.size()) {
     line = content_.substr(start);
     next_ = content_.size();
     return true;
@@ -62,7 +74,16 @@ std::optional<std::string> ReadFileBytes(const std::filesystem::path& path) {
   if (!IsDataFile(path)) return std::nullopt;
   std::ifstream in(path, std::ios::binary);
   if (!in) return std::nullopt;
-  std::string bytes((std::istreambuf_iterator<char>(in)), std::istreambuf_iterator<char>());
+  // Read in blocks into a text as large as the file, so that a large field
+  // book is held once, not in a copy twice its size.
+  std::error_code ec;
+  const std::uintmax_t size = std::filesystem::file_size(path, ec);
+  std::string bytes;
+  if (!ec) bytes.reserve(static_cast<std::size_t>(size));
+  char block[1 << 16];
+  while (in.read(block, sizeof block) || in.gcount() > 0) {
+    bytes.append(block, static_cast<std::size_t>(in.gcount()));
+  }
   if (in.bad()) return std::nullopt;
   return bytes;
 }
@@ -122,7 +143,8 @@ TextOut::TextOut(TextOut&& other) noexcept
     : file_(std::move(other.file_)),
       buffer_(std::move(other.buffer_)),
       path_(std::move(other.path_)),
-      failed_(other.failed_) {}
+      failed_(other.failed_),
+      finished_(std::exchange(other.finished_, false)) {}
 
 TextOut& TextOut::operator=(TextOut&& other) noexcept {
   if (this != &other) {
@@ -131,6 +153,7 @@ TextOut& TextOut::operator=(TextOut&& other) noexcept {
     buffer_ = std::move(other.buffer_);
     path_ = std::move(other.path_);
     failed_ = other.failed_;
+    finished_ = std::exchange(other.finished_, false);
   }
   return *this;
 }
@@ -151,14 +174,12 @@ bool TextOut::open(const std::filesystem::path& path) {
   file_.reset(std::fopen(temp.c_str(), "wb"));
 #endif
   failed_ = file_ == nullptr;
+  // Room for a block and the line that fills it, so that it never grows.
+  buffer_.reserve(kBlock + (1 << 16));
   return !failed_;
 }
 
 bool TextOut::ok() const { return file_ != nullptr && !failed_; }
-
-namespace {
-constexpr std::size_t kBlock = 1 << 16;
-}  // namespace
 
 bool TextOut::Drain() {
   if (!buffer_.empty() && ok() &&
@@ -183,8 +204,11 @@ void TextOut::Write(std::string_view text) {
 }
 
 void TextOut::Line(std::string_view text) {
-  if (!ok()) return;
   buffer_.append(text);
+  EndLine();
+}
+
+void TextOut::EndLine() {
   buffer_.append("\r\n");
   if (buffer_.size() >= kBlock) Drain();
 }
@@ -203,10 +227,20 @@ bool FlushToDisk(std::FILE* file) {
 
 }  // namespace
 
-bool TextOut::commit() {
+bool TextOut::finish() {
   if (!file_) return !failed_;
   bool written = Drain() && FlushToDisk(file_.get());
+  std::string().swap(buffer_);  // the block's memory goes back at once
   written = std::fclose(file_.release()) == 0 && written;
+  if (!written) failed_ = true;
+  finished_ = true;
+  return written;
+}
+
+bool TextOut::commit() {
+  if (!file_ && !finished_) return !failed_;
+  bool written = finish();
+  finished_ = false;
   const std::filesystem::path temp = TempPathOf(path_);
   std::error_code ec;
   if (written) {
@@ -222,9 +256,10 @@ bool TextOut::commit() {
 }
 
 void TextOut::abandon() {
-  buffer_.clear();
-  if (!file_) return;
-  std::fclose(file_.release());
+  std::string().swap(buffer_);
+  if (!file_ && !finished_) return;
+  finished_ = false;
+  if (file_) std::fclose(file_.release());
   std::error_code ec;
   std::filesystem::remove(TempPathOf(path_), ec);
 }

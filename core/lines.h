@@ -76,8 +76,19 @@ class TextOut {
   bool ok() const;
   void Line(std::string_view text);   // text + CR LF
   void Write(std::string_view text);  // text as it stands
-  // Puts the file in place; false (and the previous file kept) when a write,
-  // the flush to the disk or the rename failed.
+  // The text waiting to be written, for a line to be put together in place;
+  // EndLine ends it with CR LF.
+  std::string& Buffer() { return buffer_; }
+  void EndLine();
+  // Writes the text waiting once it fills a block.
+  void WriteFull() {
+    if (buffer_.size() >= kBlock) Drain();
+  }
+  // Writes what waits, flushes the file to the disk and closes it; false when
+  // that failed. The file is put in place by commit.
+  bool finish();
+  // Puts the file in place (finishing it first); false (and the previous
+  // file kept) when a write, the flush to the disk or the rename failed.
   bool commit();
   bool close() { return commit(); }
   // Drops what was written; the previous file stays as it was.
@@ -90,10 +101,12 @@ class TextOut {
   };
   std::unique_ptr<std::FILE, Closer> file_;
   // Written to the file a block at a time.
+  static constexpr std::size_t kBlock = 1 << 20;
   bool Drain();
   std::string buffer_;
   std::filesystem::path path_;
   bool failed_ = false;
+  bool finished_ = false;  // closed, not yet put in place
 };
 
 // An exclusive lock on a file, held by the operating system for this process

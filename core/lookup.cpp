@@ -105,9 +105,10 @@ void TimToaDoDiem(RunState& st) {
   // A point computed earlier in the run, named "DKC" + its name.
   const bool computedPoint = name.starts_with("DKC");
   const std::string_view computedName = computedPoint ? name.substr(3) : std::string_view();
-  const auto detailName = [](const ComputedPoint& point) {
-    return point.kind == PointKind::Detail ? std::optional<std::string_view>(point.name)
-                                           : std::nullopt;
+  const auto detailName = [&st](const ComputedPoint& point) {
+    return point.kind() == PointKind::Detail
+               ? std::optional<std::string_view>(st.survey.Name(point))
+               : std::nullopt;
   };
   static const std::vector<std::size_t> kNone;
   const std::vector<std::size_t>& computed =

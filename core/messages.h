@@ -82,6 +82,14 @@ inline constexpr std::string_view kNoDistance = " khong co khoang cach";
 inline constexpr std::string_view kWrongZenith = " nhap sai goc dung";
 inline constexpr std::string_view kNameTooLong = " ten dai qua 12 ky tu";
 
+// The messages of a report line "Diem " + a point's name in 12 columns + the
+// message, which the survey keeps as the name and the message's number.
+inline constexpr std::string_view kPointMessages[] = {
+    kNotANumber,         kNoDistance,   kWrongZenith,  kNegativeAngle,
+    kNegativeDistance,   kWrongDegrees, kWrongMinutes, kWrongSeconds,
+    kDistanceMayBeWrong, kRunTogether,  kNameTooLong,
+};
+
 // Files that the run must not lose.
 inline constexpr std::string_view kProductIsInput = " (trùng File đầu vào)";
 inline constexpr std::string_view kConversionOverInput =

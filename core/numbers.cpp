@@ -1,6 +1,7 @@
 #include "core/numbers.h"
 
 #include <algorithm>
+#include <array>
 #include <charconv>
 #include <cmath>
 #include <cstddef>
@@ -103,18 +104,81 @@ Scan ScanNumber(std::string_view text) {
 }
 
 double PowerOfTen(int n) {
+  // The products of tens, each exact up to 10^22.
+  static constexpr auto kPowers = [] {
+    std::array<double, 23> powers{};
+    double p = 1;
+    for (double& power : powers) {
+      power = p;
+      p *= 10;
+    }
+    return powers;
+  }();
+  const int magnitude = n < 0 ? -n : n;
+  if (magnitude < static_cast<int>(kPowers.size()))
+    return kPowers[static_cast<std::size_t>(magnitude)];
   double p = 1;
-  for (int k = 0; k < (n < 0 ? -n : n); ++k) p *= 10;
+  for (int k = 0; k < magnitude; ++k) p *= 10;
   return p;
 }
 
 constexpr double kTwoTo53 = 9007199254740992.0;
 
+// The common number of the field book, signed digits with at most one point
+// and at most 15 digits, ended by the text's end or by a character that ends
+// every number: its value is the whole number of its digits divided by a
+// power of ten, both exact, so the one rounding of the division gives the
+// nearest double, as the full conversion does. False for any other text.
+bool ScanPlainNumber(std::string_view text, Scan& scan) {
+  static constexpr double kPowers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                       1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+  std::size_t i = 0;
+  const bool negative = !text.empty() && text[0] == '-';
+  if (!text.empty() && (text[0] == '-' || text[0] == '+')) ++i;
+  std::uint64_t whole = 0;
+  int digits = 0;
+  int decimals = -1;
+  for (; i < text.size(); ++i) {
+    const char c = text[i];
+    if (IsDigit(c)) {
+      if (++digits > 15) return false;
+      whole = whole * 10 + static_cast<std::uint64_t>(c - '0');
+      if (decimals >= 0) ++decimals;
+    } else if (c == '.' && decimals < 0) {
+      decimals = 0;
+    } else {
+      break;
+    }
+  }
+  if (digits == 0) return false;
+  if (i < text.size()) {
+    const char c = text[i];
+    if (IsBlank(c) || c == 'E' || c == 'e' || c == 'D' || c == 'd') return false;
+  }
+  double value = static_cast<double>(whole);
+  if (decimals > 0) value /= kPowers[decimals];
+  scan.value = negative ? -value : value;
+  scan.has_digit = true;
+  return true;
+}
+
+Scan ScanAny(std::string_view text) {
+  Scan scan;
+  if (ScanPlainNumber(text, scan)) return scan;
+  return ScanNumber(text);
+}
+
 }  // namespace
 
-double Val(std::string_view text) { return ScanNumber(text).value; }
+double Val(std::string_view text) { return ScanAny(text).value; }
 
-bool HasNumber(std::string_view text) { return ScanNumber(text).has_digit; }
+bool HasNumber(std::string_view text) { return ScanAny(text).has_digit; }
+
+bool ReadNumber(std::string_view text, double& value) {
+  const Scan scan = ScanAny(text);
+  value = scan.value;
+  return scan.has_digit;
+}
 
 double RoundEvenWhole(double x) {
   if (!std::isfinite(x)) return x;
@@ -122,7 +186,8 @@ double RoundEvenWhole(double x) {
   const double diff = x - f;
   if (diff > 0.5) return f + 1;
   if (diff < 0.5) return f;
-  return std::fmod(f, 2.0) == 0 ? f : f + 1;
+  // Half way: the even one of f and f + 1 (f / 2 is exact).
+  return std::floor(f / 2) * 2 == f ? f : f + 1;
 }
 
 double RoundEven(double x, int n) {
@@ -134,6 +199,14 @@ double RoundEven(double x, int n) {
 }
 
 double Fix(double x) { return std::trunc(x); }
+
+double MillimetreValue(double x) {
+  const double thousandths = x * 1000;
+  // Below 2^53 the text holds the whole number of thousandths, which reads
+  // back as that number divided by 1000, rounded once.
+  if (std::fabs(thousandths) < kTwoTo53) return std::round(thousandths) / 1000 + 0.0;
+  return Val(Mask(x, "#.000"));
+}
 
 std::string Mask(double x, std::string_view mask) {
   const std::size_t point = mask.find('.');
@@ -208,6 +281,41 @@ std::string Mask(double x, std::string_view mask) {
   return out;
 }
 
+void AppendMask(std::string& out, double x, const NumberMask& mask) {
+  const double y = x * mask.scale;
+  // Beyond 2^53, not a number, or a mask wider than the digits below: the
+  // full rule.
+  constexpr int kDigits = 40;
+  if (!(std::fabs(y) < kTwoTo53) || mask.decimals + mask.wholeZeros > kDigits - 20) {
+    out += Mask(x, mask.text);
+    return;
+  }
+  const double whole = std::round(y);  // ties away from zero, as Mask rounds
+  // The digits of the whole number, right-aligned, with zeros in front up to
+  // one integer digit and up to the mask's integer zeros.
+  char digits[kDigits];
+  char* const end = digits + kDigits;
+  char* first = end;
+  for (auto n = static_cast<std::uint64_t>(std::fabs(whole)); n != 0; n /= 10) {
+    *--first = static_cast<char>('0' + n % 10);
+  }
+  while (end - first < mask.decimals + 1) *--first = '0';
+  char* const fraction = end - mask.decimals;
+  while (first < fraction && *first == '0') ++first;
+  while (fraction - first < mask.wholeZeros) *--first = '0';
+  int fractionSize = mask.decimals;
+  for (int optional = mask.optional; optional > 0 && fraction[fractionSize - 1] == '0';
+       --optional) {
+    --fractionSize;
+  }
+  if (whole < 0) out.push_back('-');
+  out.append(first, fraction);
+  if (mask.point) {
+    out.push_back('.');
+    out.append(fraction, static_cast<std::size_t>(fractionSize));
+  }
+}
+
 namespace {
 
 // NumberText of a value that is the nearest double to a decimal of at most
@@ -221,21 +329,32 @@ bool MillimetreText(double x, std::string& text) {
   if (static_cast<double>(r) / 1000 != x) return false;
   char digits[24];
   char* end = std::to_chars(digits, digits + sizeof digits, r < 0 ? -r : r).ptr;
-  std::size_t n = static_cast<std::size_t>(end - digits);
+  const auto n = static_cast<std::size_t>(end - digits);
   // The integer part (empty below 1, as the shortened "0." is) and the
   // fraction without its trailing zeros.
   const std::size_t whole = n > 3 ? n - 3 : 0;
-  std::string fraction(3 - std::min<std::size_t>(n, 3), '0');
-  fraction.append(digits + whole, n - whole);
-  while (!fraction.empty() && fraction.back() == '0') fraction.pop_back();
-  text.clear();
+  char fraction[3] = {'0', '0', '0'};
+  std::copy(digits + whole, end, fraction + 3 - (n - whole));
+  std::size_t fractionSize = 3;
+  while (fractionSize > 0 && fraction[fractionSize - 1] == '0') --fractionSize;
   if (r < 0) text.push_back('-');
   text.append(digits, whole);
-  if (!fraction.empty()) text.append(".").append(fraction);
+  if (fractionSize > 0) text.append(".").append(fraction, fractionSize);
   return true;
 }
 
 }  // namespace
+
+void AppendNumberText(std::string& out, double x) {
+  if (x != 0 && MillimetreText(x, out)) return;
+  out += NumberText(x);
+}
+
+void AppendReportNumber(std::string& out, double x) {
+  out.push_back(std::signbit(x) && x != 0 ? '-' : ' ');
+  AppendNumberText(out, std::fabs(x));
+  out.push_back(' ');
+}
 
 std::string NumberText(double x) {
   if (x == 0) return "0";
@@ -255,8 +374,9 @@ std::string NumberText(double x) {
 }
 
 std::string ReportNumber(double x) {
-  const bool negative = std::signbit(x) && x != 0;
-  return (negative ? "-" : " ") + NumberText(std::fabs(x)) + " ";
+  std::string text;
+  AppendReportNumber(text, x);
+  return text;
 }
 
 std::string SignedCount(long long value) {

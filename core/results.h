@@ -1,20 +1,17 @@
-// Recording a computed detail point for the products.
+// What a detail record holds for the products.
 #pragma once
+
+#include <string>
 
 #include "core/state.h"
 
 namespace kavu {
 
-// The descriptive-words test on field 5 (trims it in MangTruong).
-bool DescriptiveWords(RunState& st);
-
-// The code and note of the current detail record, as the coordinate text
-// file shows them.
-std::pair<std::string, std::string> CodeAndNote(RunState& st);
+// The descriptive-words test on field 5 of the current record: a code that is
+// no number, or one of at most two characters.
+bool DescriptiveWords(const RunState& st);
 
 // A prism height as the record listings write it.
 std::string PrismText(double ccg);
-
-void GhiMangSoLieuVaoSoDo(RunState& st);
 
 }  // namespace kavu

@@ -62,20 +62,24 @@ struct FileSelection {
 
 // A known point: name, X, Y, H as texts.
 using KnownPoint = std::array<std::string, 4>;
-// A field-sketch row: name, horizontal angle, distance, vertical angle, prism
-// height, note.
-using SketchRow = std::array<std::string, 6>;
 
 struct ComputationFields {
   std::int32_t err = 0;  // data errors written to the error report
   SplitMix64 rng;        // draws for check records and sketch orientation rows
 
-  // Current line of the working copy and its fields.
+  // Current line of the working copy and its fields (views into dong).
   std::string dong;
-  std::vector<std::string> MangTruong;
+  std::vector<std::string_view> MangTruong;
   int stp = 0;
   // Field i of the current record, or the empty text past its last field.
-  const std::string& Field(std::size_t i) const;
+  std::string_view Field(std::size_t i) const {
+    return i < MangTruong.size() ? MangTruong[i] : std::string_view();
+  }
+  // Where dong stands in the survey's texts: in the field book when the line
+  // stands there as dong reads (dongKept), or kept among the made texts once
+  // a point or a report line needs it.
+  std::uint64_t dongAt = 0;
+  bool dongKept = false;
 
   // Angle and distance of the current observation.
   double goc = 0, s = 0, rad = 0;
@@ -95,8 +99,6 @@ struct ComputationFields {
   std::string ccm;
   FixedText<5> DiemDau, DiemCuoi;
   std::int16_t dctdau = 1;
-  FixedText<12> TenDinhHuong2;
-  std::string StXDinhHuong2, StYDinhHuong2, StSaiGoc;
   double pvd = 0, cdhdau = 0, dscdh = 0.05;
   double gpv = 0, cdh = 0;
   std::string Tyle, Htext;
@@ -107,14 +109,12 @@ struct ComputationFields {
   double xi = 0, yi = 0, zi = 0;
   double pv2 = 0, scgcd = 0;
   double X = 0, Y = 0, Z = 0;
-  // Coordinate and distance texts are padded to their widths, never cut.
+  // Coordinate texts of a looked-up point, padded to their widths, never cut.
   FixedNumber<11> StX;
   FixedNumber<10> StY, StZ;
-  FixedNumber<8> StS;
 
-  // Tables of the run.
+  // The known points of the run.
   std::vector<KnownPoint> MangKhongChe;
-  std::vector<SketchRow> MangSoLieuSoDo;
 
   // Lookup indexes of the tables above by trimmed name, brought up to date
   // when a point is looked up: positions in MangKhongChe and
@@ -129,14 +129,13 @@ struct ComputationFields {
   std::unordered_set<std::string> controlNames;
 
   int sdkc() const { return static_cast<int>(MangKhongChe.size()); }
-  int j() const { return static_cast<int>(MangSoLieuSoDo.size()); }
 
-  // The working copy of the field book (without its control-point records),
-  // held in memory so that runs never share a file.
-  std::vector<std::string> tamsl;
-  // The field-book line (from 1) of each line of the working copy, and of the
-  // record being read (0 when none).
-  std::vector<std::size_t> tamslLine;
+  // The working copy: the lines of the field book (survey.book) that are
+  // neither blank nor control records, and their number; none when no
+  // station record stands where the station loop can reach it.
+  std::size_t workingLines = 0;
+  std::size_t stationRecords = 0;  // the records of the working copy that begin a station
+  // The field-book line (from 1) of the record being read (0 when none).
   std::size_t line = 0;
 
   // What the run found, in numbers.
@@ -169,5 +168,12 @@ struct RunState : WindowFields, FileSelection, ComputationFields {
 // Adds a message to the run's report (survey.report) and counts it; point is
 // the name the line concerns (empty when none).
 void ReportError(RunState& st, std::string_view line, std::string_view point = {});
+// Adds and counts the message "Diem " + name in 12 columns + message, message
+// being one of msg::kPointMessages.
+void ReportPoint(RunState& st, std::string_view name, std::string_view message);
+
+// Where a text stands in the survey's texts: within the current line
+// (dong) when it is part of it, otherwise kept among the made texts.
+std::uint64_t Place(RunState& st, std::string_view text);
 
 }  // namespace kavu

@@ -1,6 +1,7 @@
 #include "core/station.h"
 
 #include <cmath>
+#include <optional>
 #include <string>
 
 #include "core/lookup.h"
@@ -14,8 +15,11 @@ namespace kavu {
 namespace {
 
 void EntryError(RunState& st, std::string_view message) {
-  ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(message),
-              st.TenDiem.str());
+  // The name as it stands in the record, when the record is the point's.
+  const std::string_view first = st.Field(0).substr(0, decltype(st.TenDiem)::kWidth);
+  const std::string_view name = st.TenDiem.str();
+  const bool own = name.starts_with(first) && TrimView(name.substr(first.size())).empty();
+  ReportPoint(st, own ? first : name, message);
 }
 
 // A record whose reading, distance, zenith angle or prism height holds no
@@ -37,7 +41,12 @@ AngleParts SplitPacked(double goc) {
   const double whole = RoundEvenWhole(goc);
   AngleParts parts;
   parts.do1 = std::trunc(whole / 10000);
-  parts.phut = static_cast<std::int16_t>(std::trunc(std::fmod(whole, 10000) / 100));
+  // The remainder of a whole number below 2^53 is that of its integer.
+  const double minutesAndSeconds =
+      std::fabs(whole) < 9007199254740992.0
+          ? static_cast<double>(static_cast<std::int64_t>(whole) % 10000)
+          : std::fmod(whole, 10000);
+  parts.phut = static_cast<std::int16_t>(std::trunc(minutesAndSeconds / 100));
   parts.giay = RoundEven((goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
   return parts;
 }
@@ -46,37 +55,51 @@ double PartsDegrees(const AngleParts& parts) {
   return (parts.do1 + parts.phut / 60.0) + parts.giay / 3600;
 }
 
-// The zenith angle of the record (field 3) in degrees, decoded as the height
-// computation decodes it.
-double ZenithDegrees(const RunState& st) {
-  AngleParts parts = SplitPacked(std::fabs(Val(st.Field(3))));
-  if (parts.do1 >= 360) parts.do1 = std::fmod(parts.do1, 360);
-  return PartsDegrees(parts);
-}
-
 // The checks of a detail or peg observation before it is computed. A record
 // without a usable distance (an angle-only observation) or, when heights are
 // wanted, with a zenith angle that cannot give one, would put a false point
 // into the products: it is reported once and passed over.
-bool ObservationUsable(RunState& st) {
-  if (NumbersMissing(st, {1, 2, 3, 4})) return false;
-  if (Val(st.Field(2)) == 0) {
-    EntryError(st, msg::kNoDistance);
-    return false;
-  }
-  if (Ticked(st.fdc)) {
-    const double zenith = ZenithDegrees(st);
-    if (!(zenith > 0 && zenith < 180)) {
-      EntryError(st, msg::kWrongZenith);
-      return false;
+// The numbers of a usable observation: reading, distance, zenith angle and
+// prism height, each read once.
+struct Observation {
+  double reading = 0, distance = 0, zenith = 0, prism = 0;
+};
+std::optional<Observation> UsableObservation(RunState& st) {
+  double numbers[4];
+  for (std::size_t i = 0; i < 4; ++i) {
+    if (!ReadNumber(st.Field(i + 1), numbers[i])) {
+      EntryError(st, msg::kNotANumber);
+      return std::nullopt;
     }
   }
-  return true;
+  const Observation o{numbers[0], numbers[1], numbers[2], numbers[3]};
+  if (o.distance == 0) {
+    EntryError(st, msg::kNoDistance);
+    return std::nullopt;
+  }
+  if (Ticked(st.fdc)) {
+    const double zenith = PackedDegrees(o.zenith);
+    if (!(zenith > 0 && zenith < 180)) {
+      EntryError(st, msg::kWrongZenith);
+      return std::nullopt;
+    }
+  }
+  return o;
+}
+
+// The point of a usable observation: its height, then its coordinates.
+void ComputeObservation(RunState& st, const Observation& o) {
+  st.s = o.distance;
+  st.goc = o.zenith;
+  st.ccg = o.prism;
+  TinhDoCao(st);
+  st.goc = o.reading;
+  TinhToaDo(st);
 }
 
 // Azimuth and distance from (xFrom, yFrom) to the station, reported against
 // the station and otherName.
-void Orient(RunState& st, const std::string& otherName) {
+void Orient(RunState& st, std::string_view otherName) {
   const double dx = st.xTR - st.xDKD;
   const double dy = st.yTR - st.yDKD;
   // The angle is held in single precision, as the office's tables were made.
@@ -97,32 +120,34 @@ void Orient(RunState& st, const std::string& otherName) {
   if (st.cdh > 10000) {
     ReportError(st,
                 std::string(msg::kPointColon) + st.TenTram.str() + std::string(msg::kOr) +
-                    otherName + std::string(msg::kWrongCoordinates),
+                    std::string(otherName) + std::string(msg::kWrongCoordinates),
                 st.TenTram.str());
   }
 }
 
-// A computed detail point or peg, as the products write its coordinates.
-void NotePoint(RunState& st, PointKind kind, std::string_view name, std::string code,
-               std::string note, bool listed) {
+// A computed detail point or peg of the current record, its name, code and
+// note within its record line.
+void NotePoint(RunState& st, PointKind kind, bool words, bool listed) {
   ComputedPoint point;
-  point.name = Trim(name);
   point.x = st.xi;
   point.y = st.yi;
-  if (Ticked(st.fdc)) point.h = Val(st.StZ.str());
   point.z = st.zi;
-  point.code = std::move(code);
-  point.note = std::move(note);
-  point.kind = kind;
-  point.station = st.survey.stations.size() - 1;
-  point.line = st.line;
-  point.prism = st.ccg;
-  point.record = st.dong;
+  point.record = Place(st, st.dong) & ((std::uint64_t{1} << 61) - 1);
+  point.line = static_cast<std::uint32_t>(st.line);
+  point.station = static_cast<std::uint32_t>(st.survey.stations.size() - 1);
+  point.SetKind(kind);
   point.listed = listed;
-  st.survey.points.push_back(std::move(point));
+  point.words = words;
+  st.survey.points.push_back(point);
 }
 
 }  // namespace
+
+double PackedDegrees(double packed) {
+  AngleParts parts = SplitPacked(std::fabs(packed));
+  if (parts.do1 >= 360) parts.do1 = std::fmod(parts.do1, 360);
+  return PartsDegrees(parts);
+}
 
 void gocdo(RunState& st) {
   if (st.goc < 0) {
@@ -156,26 +181,23 @@ void GocString(RunState& st) {
   st.giay = parts.giay;
 }
 
-std::string NorthingText(double x) { return Mask(x, "#######.000"); }
-std::string EastingText(double y) { return Mask(y, "######.000"); }
-std::string HeightText(double z) { return Mask(z, "######.000"); }
+std::string NorthingText(double x) { return Mask(x, kNorthingMask.text); }
+std::string EastingText(double y) { return Mask(y, kEastingMask.text); }
+std::string HeightText(double z) { return Mask(z, kHeightMask.text); }
 
 void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
 
 void TinhDoCao(RunState& st) {
   gocdo(st);
-  GocString(st);
   st.GocD = st.goc;
   st.goc = 90 - st.goc;
   st.rad = st.goc * kPi / 180;
   st.dz = std::tan(st.rad) * st.s;
   st.zi = st.zTR + st.dz + Val(st.ccm) - st.ccg;
-  st.StZ = HeightText(st.zi);
 }
 
 void TinhToaDo(RunState& st) {
   gocdo(st);
-  GocString(st);
   // The azimuth is held in single precision at every step.
   float a = static_cast<float>((st.pvd + st.goc) - 180);
   if (a < 0) a = static_cast<float>(a + 360.0);
@@ -186,21 +208,18 @@ void TinhToaDo(RunState& st) {
   st.xi = RoundEven(st.xTR + st.dx, 3);
   st.yi = RoundEven(st.yTR + st.dy, 3);
   st.s = RoundEven(st.s, 3);
-  st.StX = NorthingText(st.xi);
-  st.StY = EastingText(st.yi);
-  st.StS = Mask(st.s, "#####.000");
 }
 
 void ReportLongName(RunState& st, std::string_view name) {
   if (name.size() > decltype(st.TenDiem)::kWidth) {
-    ReportError(st, std::string(msg::kPoint) + std::string(name) + std::string(msg::kNameTooLong),
-                name);
+    ReportPoint(st, name, msg::kNameTooLong);
   }
 }
 
 void STP5(RunState& st) {
   ReportLongName(st, st.Field(0));
-  if (!ObservationUsable(st)) return;
+  const auto observation = UsableObservation(st);
+  if (!observation) return;
   if (st.dctdau == 1) {
     st.DiemDau = st.TenDiem.str();
     st.DiemCuoi = st.TenDiem.str();
@@ -208,17 +227,10 @@ void STP5(RunState& st) {
   } else {
     st.DiemCuoi = st.TenDiem.str();
   }
-  st.s = Val(st.Field(2));
-  st.goc = Val(st.Field(3));
-  st.ccg = Val(st.Field(4));
-  TinhDoCao(st);
-  st.goc = Val(st.Field(1));
-  TinhToaDo(st);
-  auto [code, note] = CodeAndNote(st);
+  ComputeObservation(st, *observation);
   // Descriptive words are the code; a record without them is listed too.
-  const bool listed = st.stp == 5 || !code.empty();
-  NotePoint(st, PointKind::Detail, st.TenDiem.str(), std::move(code), std::move(note), listed);
-  GhiMangSoLieuVaoSoDo(st);
+  const bool words = (st.stp == 6 || st.stp == 7) && DescriptiveWords(st);
+  NotePoint(st, PointKind::Detail, words, st.stp == 5 || words);
 }
 
 void STP6(RunState& st) {
@@ -238,17 +250,15 @@ void STP6(RunState& st) {
     return;
   }
   ReportLongName(st, st.Field(5));
-  if (!ObservationUsable(st)) return;
-  st.s = Val(st.Field(2));
-  st.goc = Val(st.Field(3));
-  st.ccg = Val(st.Field(4));
-  TinhDoCao(st);
-  st.goc = Val(st.Field(1));
-  TinhToaDo(st);
-  NotePoint(st, PointKind::Peg, st.TenKC.str(), std::string(),
-            st.stp > 6 ? st.Field(6) : std::string(), false);
+  const auto observation = UsableObservation(st);
+  if (!observation) return;
+  ComputeObservation(st, *observation);
+  NotePoint(st, PointKind::Peg, false, false);
   // The peg becomes a known point for the rest of the run, listed with its
   // height and note.
+  st.StX = NorthingText(st.xi);
+  st.StY = EastingText(st.yi);
+  st.StZ = HeightText(st.zi);
   st.MangKhongChe.push_back({st.TenKC.str(), st.StX.str(), st.StY.str(), st.StZ.str()});
   const std::string name = Trim(st.TenKC.str());
   st.listedNames.insert(name);
@@ -258,7 +268,8 @@ void STP6(RunState& st) {
 void STP7(RunState& st) {
   if (NumbersMissing(st, {1, 2})) return;
   st.TenKC = st.Field(5);
-  st.TenDinhHuong2 = st.TenKC.str();
+  SketchTexts& sketch = st.survey.stations.back().sketch;
+  sketch.checkName = st.TenKC.str();
   std::string& checkRecord = st.survey.stations.back().checkRecord;
   checkRecord = "DKD2 " + st.TenKC.str();
   // The record's own distance is the one checked.
@@ -271,16 +282,15 @@ void STP7(RunState& st) {
   if (found) {
     st.xDKD = st.X;
     st.yDKD = st.Y;
-    st.StXDinhHuong2 = st.StX.str();
-    st.StYDinhHuong2 = st.StY.str();
-    Orient(st, st.TenDinhHuong2.str());
+    sketch.checkX = st.StX.str();
+    sketch.checkY = st.StY.str();
+    Orient(st, sketch.checkName);
     st.scgcd = st.gpv - st.pvd;
     if (st.scgcd >= 360) st.scgcd -= 360;
     if (st.scgcd < 0) st.scgcd += 360;
     st.scgcd = st.pv2 - st.scgcd;
     st.goc = st.scgcd;
     GocString(st);
-    st.StSaiGoc = st.StGoc;
     StationResult& station = st.survey.stations.back();
     station.check = SurveyPoint{Trim(st.TenKC.str()), st.X, st.Y, std::nullopt};
     station.checkResidual = st.scgcd;
@@ -289,12 +299,13 @@ void STP7(RunState& st) {
   if (!found) {
     // Without the check point nothing can be computed: keep the reading as
     // written rather than make one up.
-    st.StSaiGoc.clear();
-    st.StXDinhHuong2.clear();
-    st.StYDinhHuong2.clear();
-    checkRecord += " " + st.Field(1);
-  } else if (Val(Trim(st.Field(1))) != 0) {
-    checkRecord += " " + st.Field(1);
+    sketch.checkX.clear();
+    sketch.checkY.clear();
+    checkRecord += " ";
+    checkRecord += st.Field(1);
+  } else if (Val(TrimView(st.Field(1))) != 0) {
+    checkRecord += " ";
+    checkRecord += st.Field(1);
   } else {
     // No reading was recorded: make one from the computed angle, within half
     // a minute of it.
@@ -312,7 +323,8 @@ void STP7(RunState& st) {
     st.StGoc = Trim(Mask(Val(st.StGoc), "#######"));
     checkRecord += " " + st.StGoc;
   }
-  checkRecord += " " + st.Field(2);
+  checkRecord += " ";
+  checkRecord += st.Field(2);
 }
 
 }  // namespace kavu

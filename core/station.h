@@ -1,17 +1,26 @@
 // The surveying mathematics of a station and the routines of its records.
 #pragma once
 
+#include "core/numbers.h"
 #include "core/state.h"
 
 namespace kavu {
 
+// A packed angle's magnitude in decimal degrees, as gocdo decodes it.
+double PackedDegrees(double packed);
 // Decodes the packed angle in goc, checks it and the distance s, reports entry
 // errors against TenDiem.
 void gocdo(RunState& st);
 // StGoc = the text of goc (decimal degrees).
 void GocString(RunState& st);
 
-// The texts of a computed point's X, Y and height as the products write them.
+// The masks of a computed point's X, Y, height, prism height and distance as
+// the products write them, and the texts.
+inline constexpr NumberMask kNorthingMask = ReadMask("#######.000");
+inline constexpr NumberMask kEastingMask = ReadMask("######.000");
+inline constexpr NumberMask kHeightMask = ReadMask("######.000");
+inline constexpr NumberMask kPrismMask = ReadMask("####.000");
+inline constexpr NumberMask kDistanceMask = ReadMask("#####.000");
 std::string NorthingText(double x);
 std::string EastingText(double y);
 std::string HeightText(double z);

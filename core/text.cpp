@@ -20,15 +20,31 @@ std::string Upper(std::string_view text) {
 }
 
 std::string FixedWidth(std::string_view text, std::size_t width) {
-  std::string out(text.substr(0, width));
-  out.resize(width, ' ');
+  std::string out;
+  AppendFixed(out, text, width);
   return out;
 }
 
 std::string NumberWidth(std::string_view text, std::size_t width) {
   std::string out(text);
-  if (out.size() < width) out.resize(width, ' ');
+  PadBehind(out, 0, width);
   return out;
+}
+
+void PadBehind(std::string& out, std::size_t from, std::size_t width) {
+  const std::size_t size = out.size() - from;
+  if (size < width) out.append(width - size, ' ');
+}
+
+void PadInFront(std::string& out, std::size_t from, std::size_t width) {
+  const std::size_t size = out.size() - from;
+  if (size < width) out.insert(from, width - size, ' ');
+}
+
+void AppendFixed(std::string& out, std::string_view text, std::size_t width) {
+  const std::size_t from = out.size();
+  out.append(text.substr(0, width));
+  PadBehind(out, from, width);
 }
 
 namespace {
@@ -54,17 +70,17 @@ std::string NumberColumn(std::string_view text, int width) {
   return out;
 }
 
-int KTraCCG(std::string& text) {
-  text = Trim(text);
-  int result = 0;
-  for (const char c : text) {
-    if (!((c >= '0' && c <= '9') || c == '.')) result = 1;
+int KTraCCG(std::string_view text) {
+  for (const char c : TrimView(text)) {
+    if (!((c >= '0' && c <= '9') || c == '.')) return 1;
   }
-  return result;
+  return 0;
 }
 
-void SplitFields(std::string& line, std::vector<std::string>& fields) {
-  // Normalised in place: the text only ever gets shorter.
+namespace {
+
+// Tabs turned into spaces and runs of spaces reduced to one, in place.
+void Normalise(std::string& line) {
   std::size_t size = 0;
   for (char c : line) {
     if (c == '\t') c = ' ';
@@ -72,37 +88,60 @@ void SplitFields(std::string& line, std::vector<std::string>& fields) {
     line[size++] = c;
   }
   line.resize(size);
+}
 
-  // The vector's strings keep their storage from one line to the next.
-  std::size_t count = 0;
-  auto add = [&](std::string_view field) {
-    if (count < fields.size()) {
-      fields[count].assign(field);
-    } else {
-      fields.emplace_back(field);
-    }
-    ++count;
-  };
-  const std::string_view text = line;
-  if (!text.empty()) {
-    std::size_t start = 0;
-    for (;;) {
-      const std::size_t space = text.find(' ', start);
-      if (space == std::string_view::npos) {
-        add(text.substr(start));
-        break;
-      }
-      add(text.substr(start, space - start));
-      start = space + 1;
+template <typename Add>
+void EachField(std::string_view text, Add add) {
+  if (text.empty()) return;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    if (text[i] == ' ') {
+      add(text.substr(start, i - start));
+      start = i + 1;
     }
   }
-  fields.resize(count);
+  add(text.substr(start));
+}
+
+}  // namespace
+
+void SplitFields(std::string& line, std::vector<std::string_view>& fields) {
+  fields.clear();
+  // Most lines are already normal: split in the pass that finds it out.
+  const std::string_view text = line;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < text.size(); ++i) {
+    const char c = text[i];
+    if (c == '\t' || (c == ' ' && i > 0 && text[i - 1] == ' ')) {
+      Normalise(line);
+      fields.clear();
+      EachField(line, [&](std::string_view field) { fields.push_back(field); });
+      return;
+    }
+    if (c == ' ') {
+      fields.push_back(text.substr(start, i - start));
+      start = i + 1;
+    }
+  }
+  if (!text.empty()) fields.push_back(text.substr(start));
 }
 
 std::vector<std::string> SplitFields(std::string& line) {
+  Normalise(line);
   std::vector<std::string> fields;
-  SplitFields(line, fields);
+  EachField(line, [&](std::string_view field) { fields.emplace_back(field); });
   return fields;
+}
+
+std::string_view RecordField(std::string_view record, std::size_t k) {
+  std::size_t start = 0;
+  for (; k > 0; --k) {
+    const std::size_t space = record.find(' ', start);
+    if (space == std::string_view::npos) return {};
+    start = space + 1;
+  }
+  if (start > record.size()) return {};
+  return record.substr(start, record.find(' ', start) - start);
 }
 
 }  // namespace kavu

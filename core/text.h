@@ -2,6 +2,7 @@
 // Every text here is TCVN3 bytes, one byte per character.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <string>
 #include <string_view>
@@ -29,14 +30,23 @@ std::string NumberWidth(std::string_view text, std::size_t width);
 // never runs into the value before it and the line still splits into fields.
 std::string NumberColumn(std::string_view text, int width);
 
+// The text from `from` to the end of out, padded behind (PadBehind) or in
+// front (PadInFront) to width; a longer text stays whole. For a text without
+// surrounding spaces, these are NumberWidth and RString in place; NumberColumn
+// in place is PadInFront to width - 1 after a space.
+void PadBehind(std::string& out, std::size_t from, std::size_t width);
+void PadInFront(std::string& out, std::size_t from, std::size_t width);
+// text appended cut to width and padded behind to it (FixedWidth in place).
+void AppendFixed(std::string& out, std::string_view text, std::size_t width);
+
 // RString / LString: when text is shorter than width, the trimmed text padded
 // to exactly width (spaces in front / behind); otherwise text unchanged.
 std::string RString(std::string_view text, int width);
 std::string LString(std::string_view text, int width);
 
-// KTraCCG: trims text in place; 1 when the trimmed text holds a character
-// other than the digits and ".", otherwise 0.
-int KTraCCG(std::string& text);
+// KTraCCG: 1 when the trimmed text holds a character other than the digits
+// and ".", otherwise 0.
+int KTraCCG(std::string_view text);
 
 // A fixed-width text field of the computation state (names 12, X 11, Y 10...).
 // A name is cut to the width; a number (Cut = false) is only padded.
@@ -64,7 +74,28 @@ using FixedNumber = FixedText<N, false>;
 // normalised text written back into line; the fields returned. The caller has
 // already removed the surrounding spaces.
 std::vector<std::string> SplitFields(std::string& line);
-// The same into fields, whose strings are reused.
-void SplitFields(std::string& line, std::vector<std::string>& fields);
+// The same as views into line.
+void SplitFields(std::string& line, std::vector<std::string_view>& fields);
+
+// Field k (from 0) of a line whose fields are set off by single spaces, or the
+// empty text past its last field.
+std::string_view RecordField(std::string_view record, std::size_t k);
+// The first fields of such a line, the empty text past its last; the number
+// of its fields.
+template <std::size_t N>
+std::size_t RecordFields(std::string_view record, std::array<std::string_view, N>& fields) {
+  fields = {};
+  std::size_t count = 0;
+  if (record.empty()) return 0;
+  std::size_t start = 0;
+  for (std::size_t i = 0; i < record.size(); ++i) {
+    if (record[i] != ' ') continue;
+    if (count < N) fields[count] = record.substr(start, i - start);
+    ++count;
+    start = i + 1;
+  }
+  if (count < N) fields[count] = record.substr(start);
+  return count + 1;
+}
 
 }  // namespace kavu

@@ -21,6 +21,11 @@ Position RoundedPosition(const std::string& textX, const std::string& textY) {
   return {RoundEven(Val(textX), 3), RoundEven(Val(textY), 3)};
 }
 
+// A computed point drawn where the coordinate text file puts it.
+Position RoundedPosition(const ComputedPoint& point) {
+  return {RoundEven(MillimetreValue(point.x), 3), RoundEven(MillimetreValue(point.y), 3)};
+}
+
 // The ASCII drawing file is written as pairs of lines: a group code, then its
 // value. Group 10 is the drawing's x, which carries the easting Y; group 20
 // carries the northing X. No entity carries a handle (group 5): readers give
@@ -28,23 +33,29 @@ Position RoundedPosition(const std::string& textX, const std::string& textY) {
 // makes a reader keep only the last of them.
 class EntityWriter {
  public:
-  explicit EntityWriter(TextOut& out) : out_(out) {}
+  explicit EntityWriter(TextOut& out) : out_(out), text_(out.Buffer()) {}
 
   void Pair(std::string_view code, std::string_view value) {
-    out_.Line(code);
-    out_.Line(value);
+    text_.append(code).append("\r\n").append(value).append("\r\n");
+    out_.WriteFull();
+  }
+  void Pair(std::string_view code, double value) {
+    text_.append(code).append("\r\n");
+    AppendReportNumber(text_, value);
+    text_.append("\r\n");
+    out_.WriteFull();
   }
 
   void Point(std::string_view layer, const Position& p, bool controlPoint) {
     Pair("  0", "POINT");
     Pair("  8", layer);
     if (controlPoint) Pair(" 62", "     1");
-    Pair(" 10", ReportNumber(p.y));
-    Pair(" 20", ReportNumber(p.x));
+    Pair(" 10", p.y);
+    Pair(" 20", p.x);
   }
 
   // The label sits half a label height north and east of its point.
-  void Label(const Position& p, double offset, double height, std::string_view name,
+  void Label(const Position& p, double offset, std::string_view height, std::string_view name,
              bool controlPoint) {
     const double lx = RoundEven(p.x + offset, 3);
     const double ly = RoundEven(p.y + offset, 3);
@@ -56,27 +67,27 @@ class EntityWriter {
       Pair("  8", "DIEM_ID");
       Pair(" 62", "    3");
     }
-    Pair(" 10", ReportNumber(ly));
-    Pair(" 20", ReportNumber(lx));
+    Pair(" 10", ly);
+    Pair(" 20", lx);
     Pair(" 30", "0.0");
-    Pair(" 40", ReportNumber(height));
+    Pair(" 40", height);
     Pair("  1", name);
     Pair(" 41", "0.8");
   }
 
  private:
   TextOut& out_;
+  std::string& text_;
 };
 
 }  // namespace
 
-bool indxf(const RunState& st) {
-  TextOut out;
-  if (!out.open(st.daufile + ".dxf")) return false;
-
+void WriteDrawing(TextOut& out, const RunState& st) {
   // Label height on the ground: millimetres on paper times the scale.
   double h = Val(st.Htext) * Val(st.Tyle) / 1000;
   if (!std::isfinite(h) || !std::isfinite(1.5 * h)) h = 0;
+  const std::string controlHeight = ReportNumber(1.5 * h);
+  const std::string detailHeight = ReportNumber(h);
 
   EntityWriter dxf(out);
   dxf.Pair(" 0", "SECTION");
@@ -87,13 +98,12 @@ bool indxf(const RunState& st) {
   }
   for (const KnownPoint& point : st.MangKhongChe) {
     const Position p = RoundedPosition(point[1], point[2]);
-    dxf.Label(p, h / 2, 1.5 * h, TrimView(point[0]), true);
+    dxf.Label(p, h / 2, controlHeight, TrimView(point[0]), true);
   }
   for (const ComputedPoint& point : st.survey.points) {
-    if (point.kind != PointKind::Detail) continue;
-    // Drawn where the coordinate text file puts it.
-    const Position p = RoundedPosition(NorthingText(point.x), EastingText(point.y));
-    dxf.Label(p, h / 2, h, point.name, false);
+    if (point.kind() != PointKind::Detail) continue;
+    const Position p = RoundedPosition(point);
+    dxf.Label(p, h / 2, detailHeight, st.survey.Name(point), false);
     dxf.Point("DIEM", p, false);
   }
 
@@ -101,7 +111,6 @@ bool indxf(const RunState& st) {
   out.Line("ENDSEC");
   out.Line(" 0");
   out.Line("EOF");
-  return out.close();
 }
 
 }  // namespace kavu

@@ -6,7 +6,8 @@
 
 namespace kavu {
 
-// Writes daufile + ".dxf"; false when the file could not be written.
-bool indxf(const RunState& st);
+// The drawing of the run's control points (MangKhongChe) and detail points,
+// labels as high as the run's text height at its scale.
+void WriteDrawing(TextOut& out, const RunState& st);
 
 }  // namespace kavu

@@ -19,7 +19,7 @@ constexpr std::size_t kLongestReading = 7;
 // book.
 constexpr int kColumn = 8;
 
-bool ReadingTooLong(std::string_view reading) { return Trim(reading).size() > kLongestReading; }
+bool ReadingTooLong(std::string_view reading) { return TrimView(reading).size() > kLongestReading; }
 
 }  // namespace
 
@@ -40,12 +40,10 @@ void CheckPegReadings(RunState& st, std::size_t firstPoint) {
   if (!Ticked(st.fcp)) return;
   for (std::size_t i = firstPoint; i < st.survey.points.size(); ++i) {
     const ComputedPoint& point = st.survey.points[i];
-    if (point.kind != PointKind::Peg) continue;
-    std::string record = point.record;
-    const std::vector<std::string> fields = SplitFields(record);
-    if (ReadingTooLong(fields[1])) {
-      const std::string name = FixedWidth(fields[5], 12);
-      ReportError(st, "Diem " + name + std::string(msg::kWrongDegrees), name);
+    if (point.kind() != PointKind::Peg) continue;
+    const std::string_view record = st.survey.Record(point);
+    if (ReadingTooLong(RecordField(record, 1))) {
+      ReportPoint(st, RecordField(record, 5).substr(0, 12), msg::kWrongDegrees);
       return;
     }
   }
@@ -55,7 +53,7 @@ void WritePegBlocks(TextOut& out, const Survey& survey) {
   std::optional<std::size_t> station;
   bool ended = false;
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind != PointKind::Peg) continue;
+    if (point.kind() != PointKind::Peg) continue;
     if (point.station != station) {
       station = point.station;
       ended = false;
@@ -67,13 +65,12 @@ void WritePegBlocks(TextOut& out, const Survey& survey) {
     if (ended) continue;
     // The record's fields: point, reading, distance, zenith, prism height,
     // peg name and the note.
-    std::string record = point.record;
-    const std::vector<std::string> f = SplitFields(record);
-    ended = ReadingTooLong(f[1]);
+    const std::string_view record = survey.Record(point);
+    const auto f = [&](std::size_t k) { return RecordField(record, k); };
+    ended = ReadingTooLong(f(1));
     if (ended) continue;
-    out.Line(" " + FixedWidth(f[5], 12) + RString(Trim(f[1]), kColumn) +
-             NumberColumn(f[2], kColumn) + NumberColumn(f[3], kColumn) + " " + Trim(f[4]) + " " +
-             (f.size() > 6 ? Trim(f[6]) : std::string()));
+    out.Line(" " + FixedWidth(f(5), 12) + RString(f(1), kColumn) + NumberColumn(f(2), kColumn) +
+             NumberColumn(f(3), kColumn) + " " + std::string(f(4)) + " " + std::string(f(6)));
   }
 }
 

@@ -16,12 +16,13 @@
 
 namespace kavu {
 
-void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report) {
+void WriteErrorReport(TextOut& out, const Survey& survey) {
   out.Line(msg::kErrHeader1);
   out.Line(msg::kErrHeader2);
-  for (const ReportEntry& entry : report) {
-    if (entry.counted) out.Line("");
-    out.Line(entry.text);
+  for (const ReportEntry& entry : survey.report) {
+    if (entry.counted) out.EndLine();
+    survey.AppendText(out.Buffer(), entry);
+    out.EndLine();
   }
 }
 
@@ -36,30 +37,59 @@ std::string OrientationDistanceText(double distance) {
 void WriteStationListing(TextOut& out, const Survey& survey) {
   // The first and last detail point of each station.
   struct Ends {
-    std::string_view first, last;
-    bool any = false;
+    const ComputedPoint* first = nullptr;
+    const ComputedPoint* last = nullptr;
   };
   std::vector<Ends> ends(survey.stations.size());
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind != PointKind::Detail) continue;
+    if (point.kind() != PointKind::Detail) continue;
     Ends& e = ends[point.station];
-    if (!e.any) e.first = point.name;
-    e.last = point.name;
-    e.any = true;
+    if (e.first == nullptr) e.first = &point;
+    e.last = &point;
   }
+  const auto name = [&](const ComputedPoint* point) {
+    return FixedWidth(point != nullptr ? survey.Name(*point) : std::string_view(), 5);
+  };
   for (std::size_t i = 0; i < survey.stations.size(); ++i) {
     const StationResult& s = survey.stations[i];
     out.Line(FixedWidth(s.station.name, 12) + FixedWidth(s.orientation.name, 12) + " " +
              GocStringText(s.backBearing) + " " + OrientationDistanceText(s.orientationDistance) +
-             "    " + FixedWidth(ends[i].first, 5) + " -  " + FixedWidth(ends[i].last, 5));
+             "    " + name(ends[i].first) + " -  " + name(ends[i].last));
   }
 }
 
-std::string CoordinateTextLine(const ComputedPoint& p, int decimals) {
-  const std::string height =
-      NumberColumn(NumberText(RoundEven(Val(HeightText(p.z)), decimals)), 10);
-  return FixedWidth(p.name, 5) + " " + NumberWidth(NorthingText(p.x), 11) + " " +
-         NumberWidth(EastingText(p.y), 10) + " " + height + " " + p.code + " " + p.note;
+namespace {
+
+// A number of its mask in a column of width, set off by at least one space.
+void AppendColumn(std::string& out, double x, const NumberMask& mask, std::size_t width) {
+  out.push_back(' ');
+  const std::size_t from = out.size();
+  AppendMask(out, x, mask);
+  PadInFront(out, from, width - 1);
+}
+
+}  // namespace
+
+void AppendCoordinateTextLine(std::string& out, const Survey& survey, const ComputedPoint& p,
+                              int decimals) {
+  const Survey::PointTexts texts = survey.Texts(p);
+  AppendFixed(out, texts.name, 5);
+  out.push_back(' ');
+  std::size_t from = out.size();
+  AppendMask(out, p.x, kNorthingMask);
+  PadBehind(out, from, 11);
+  out.push_back(' ');
+  from = out.size();
+  AppendMask(out, p.y, kEastingMask);
+  PadBehind(out, from, 10);
+  out.append("  ");
+  from = out.size();
+  AppendNumberText(out, RoundEven(MillimetreValue(p.z), decimals));
+  PadInFront(out, from, 9);
+  out.push_back(' ');
+  out.append(texts.code);
+  out.push_back(' ');
+  out.append(texts.note);
 }
 
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
@@ -72,43 +102,40 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
   std::string line =
       ControlLine(FixedWidth(entry.name, 12), NumberWidth(NorthingText(point.x), 11),
                   NumberWidth(EastingText(point.y), 10), entry.height ? &z : nullptr);
-  if (point.kind == PointKind::Peg && !point.note.empty()) line += " " + point.note;
+  if (point.kind() == PointKind::Peg && !survey.Note(point).empty()) {
+    line += " ";
+    line += survey.Note(point);
+  }
   return line;
 }
 
-std::string CoordinateListingLine(const ComputedPoint& p) {
-  std::string line = LString(p.name, 5) + NumberColumn(NorthingText(p.x), 12) +
-                     NumberColumn(EastingText(p.y), 12) + NumberColumn(HeightText(p.z), 12) +
-                     NumberColumn(PrismText(p.prism), 10);
-  if (!p.code.empty()) line += " " + p.code;
-  if (!p.note.empty()) line += " " + p.note;
-  return line;
+void AppendCoordinateListingLine(std::string& out, const Survey& survey, const ComputedPoint& p) {
+  const Survey::PointTexts texts = survey.Texts(p);
+  const std::size_t from = out.size();
+  out.append(texts.name);
+  PadBehind(out, from, 5);
+  AppendColumn(out, p.x, kNorthingMask, 12);
+  AppendColumn(out, p.y, kEastingMask, 12);
+  AppendColumn(out, p.z, kHeightMask, 12);
+  AppendColumn(out, Val(texts.prism), kPrismMask, 10);
+  for (const std::string_view words : {texts.code, texts.note}) {
+    if (!words.empty()) out.append(" ").append(words);
+  }
+}
+
+std::optional<std::string> OverInput(const RunState& st, const std::string& path) {
+  for (const std::string& input : st.inputs) {
+    if (WouldReplace(path, input)) return path + std::string(msg::kProductIsInput);
+  }
+  return std::nullopt;
 }
 
 bool ProductOverInput(RunState& st, const std::string& path) {
-  for (const std::string& input : st.inputs) {
-    if (WouldReplace(path, input)) {
-      st.unwritable.push_back(path + std::string(msg::kProductIsInput));
-      return true;
-    }
-  }
-  return false;
+  const auto refused = OverInput(st, path);
+  if (refused) st.unwritable.push_back(*refused);
+  return refused.has_value();
 }
 
-namespace {
-
-// Writes one product whole or not at all; a product that cannot be written, or
-// would replace a file the run reads, is named for the summary and the run
-// goes on with the next.
-template <typename Body>
-void WriteProduct(RunState& st, const std::string& path, Body body) {
-  if (ProductOverInput(st, path)) return;
-  TextOut out(path);
-  body(out);
-  if (!out.commit()) st.unwritable.push_back(path);
-}
-
-// The control-point listing, ended by an empty line.
 void WriteControlListing(TextOut& out, const Survey& survey) {
   for (const ControlListing& entry : survey.controlListing) {
     out.Line(ControlListingLine(survey, entry));
@@ -116,8 +143,6 @@ void WriteControlListing(TextOut& out, const Survey& survey) {
   out.Line("");
 }
 
-// The records of each computed station under its station and orientation
-// lines: as they were read (the TRIDO book), or as their coordinates (.td1).
 void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
   std::optional<std::size_t> station;
   for (const ComputedPoint& point : survey.points) {
@@ -128,43 +153,25 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
       out.Line("DKD " + FixedWidth(s.orientation.name, 12));
     }
     if (!coordinates) {
-      out.Line(point.record);
+      out.Line(survey.Record(point));
     } else if (point.listed) {
-      out.Line(CoordinateListingLine(point));
+      AppendCoordinateListingLine(out.Buffer(), survey, point);
+      out.EndLine();
     }
+  }
+}
+
+void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals) {
+  for (const ComputedPoint& point : survey.points) {
+    if (point.kind() != PointKind::Detail) continue;
+    AppendCoordinateTextLine(out.Buffer(), survey, point, decimals);
+    out.EndLine();
   }
 }
 
 int HeightDecimals(const std::string& text) {
   const double d = RoundEvenWhole(Val(text));
   return static_cast<int>(std::clamp(d, 0.0, 10.0));
-}
-
-}  // namespace
-
-void WriteTextProducts(RunState& st) {
-  if (Ticked(st.fkc)) {
-    WriteProduct(st, st.daufile + ".kc",
-                 [&](TextOut& out) { WriteControlListing(out, st.survey); });
-  }
-  if (Ticked(st.fasc)) {
-    std::error_code ignored;
-    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
-    for (const bool coordinates : {false, true}) {
-      WriteProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1, [&](TextOut& out) {
-        WriteControlListing(out, st.survey);
-        WriteStationRecords(out, st.survey, coordinates);
-      });
-    }
-  }
-  if (Ticked(st.ftd)) {
-    const int decimals = HeightDecimals(st.txtSoleDC);
-    WriteProduct(st, st.daufile + ".txt", [&](TextOut& out) {
-      for (const ComputedPoint& point : st.survey.points) {
-        if (point.kind == PointKind::Detail) out.Line(CoordinateTextLine(point, decimals));
-      }
-    });
-  }
 }
 
 }  // namespace kavu

@@ -1,6 +1,7 @@
 // The run's own reports and text products.
 #pragma once
 
+#include <optional>
 #include <string>
 
 #include "core/state.h"
@@ -9,7 +10,7 @@ namespace kavu {
 
 // The error report (.err): its head, then each message, an error set off by
 // an empty line.
-void WriteErrorReport(TextOut& out, const std::vector<ReportEntry>& report);
+void WriteErrorReport(TextOut& out, const Survey& survey);
 void WriteStationListingHeader(TextOut& out);
 // The station listing's line for each computed station: station, orientation,
 // azimuth from the orientation point, orientation distance, first and last
@@ -19,20 +20,32 @@ void WriteStationListing(TextOut& out, const Survey& survey);
 // sketch show it.
 std::string OrientationDistanceText(double distance);
 
-// True when the product at path would replace a file the run reads: it is
-// then named in st.unwritable and must be passed over.
+// The refusal to write the product at path when it would replace a file the
+// run reads (the path and the words saying so), or nothing.
+std::optional<std::string> OverInput(const RunState& st, const std::string& path);
+// The same, the refusal named in st.unwritable; true when the product must be
+// passed over.
 bool ProductOverInput(RunState& st, const std::string& path);
 
-// The products after the station loop: .kc, the regenerated field book with
-// its .td1, the .txt. Unwritable ones are added to st.unwritable.
-void WriteTextProducts(RunState& st);
+// The products after the station loop: the control-point listing (.kc, and
+// the head of the TRIDO book and the .td1), ended by an empty line; the
+// records of each computed station under its station and orientation lines,
+// as they were read (the TRIDO book) or as their coordinates (.td1); the
+// coordinate text file (.txt) with heights to decimals.
+void WriteControlListing(TextOut& out, const Survey& survey);
+void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates);
+void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals);
+// The decimals of the .txt heights, as typed (0 to 10).
+int HeightDecimals(const std::string& text);
 
 // A line of the control-point listing (.kc and the head of the TRIDO book and
-// .td1), and a detail point's line of the coordinate listing (.td1).
+// .td1), and a detail point's line of the coordinate listing (.td1), appended.
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry);
-std::string CoordinateListingLine(const ComputedPoint& point);
+void AppendCoordinateListingLine(std::string& out, const Survey& survey,
+                                 const ComputedPoint& point);
 
-// A line of the coordinate text file for a computed detail point.
-std::string CoordinateTextLine(const ComputedPoint& point, int decimals);
+// A line of the coordinate text file for a computed detail point, appended.
+void AppendCoordinateTextLine(std::string& out, const Survey& survey, const ComputedPoint& point,
+                              int decimals);
 
 }  // namespace kavu

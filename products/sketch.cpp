@@ -1,9 +1,14 @@
 #include "products/sketch.h"
 
+#include <algorithm>
+#include <cmath>
+#include <span>
 #include <string>
 #include <string_view>
 
+#include "core/angles.h"
 #include "core/numbers.h"
+#include "core/results.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
@@ -34,56 +39,107 @@ constexpr std::string_view kColumnHeads2 =
 // Every ruled line of the form is 77 characters wide.
 constexpr std::size_t kFormWidth = 77;
 
-std::string T(std::string_view utf8) { return Utf8ToTcvn3(utf8); }
+// The form's words in TCVN3, converted once.
+struct FormWords {
+  std::string sketchNumber = Utf8ToTcvn3(kSketchNumber), station = Utf8ToTcvn3(kStation),
+              area = Utf8ToTcvn3(kArea), instrument = Utf8ToTcvn3(kInstrument),
+              instrumentNumber = Utf8ToTcvn3(kInstrumentNumber), surveyor = Utf8ToTcvn3(kSurveyor),
+              recorder = Utf8ToTcvn3(kRecorder), date = Utf8ToTcvn3(kDate),
+              stationCoordinates = Utf8ToTcvn3(kStationCoordinates),
+              orientation1 = Utf8ToTcvn3(kOrientation1), orientation2 = Utf8ToTcvn3(kOrientation2),
+              columnHeads1 = Utf8ToTcvn3(kColumnHeads1), columnHeads2 = Utf8ToTcvn3(kColumnHeads2);
+};
 
 // One detail row: point, distance, horizontal angle, vertical angle, prism
 // height, note between the bars of columns 1, 8, 19, 34, 48, 62 and 77. A name
 // of six characters or more pushes the rest of its row to the right.
-std::string DetailRow(const SketchRow& row) {
-  return "|" + LString(Trim(row[0]), 5) + " |" + RString(Trim(row[2]), 9) + " |  " + row[1] +
-         "  |  " + NumberWidth(row[3], 11) + "| " + NumberWidth(row[4], 10) + "  | " +
-         FixedWidth(row[5], 12) + " |";
+void AppendDetailRow(std::string& out, const Survey& survey, const ComputedPoint& point) {
+  std::array<std::string_view, 7> f;
+  const std::size_t fields = RecordFields(survey.Record(point), f);
+  const double reading = PackedDegrees(Val(f[1]));
+  const double distance = RoundEven(std::fabs(Val(f[2])), 3);
+  const double zenith = PackedDegrees(Val(f[3]));
+  out.push_back('|');
+  std::size_t from = out.size();
+  out.append(f[0].substr(0, 12));
+  PadBehind(out, from, 5);
+  out.append(" |");
+  from = out.size();
+  AppendMask(out, distance, kDistanceMask);
+  PadInFront(out, from, 9);
+  out.append(" |  ");
+  AppendAngle(out, reading, " ", 10);
+  out.append("  |  ");
+  from = out.size();
+  AppendAngle(out, zenith, " ", 9);
+  PadBehind(out, from, 11);
+  out.append("| ");
+  from = out.size();
+  AppendMask(out, Val(f[4]), kPrismMask);
+  PadInFront(out, from, 10);
+  out.append("  | ");
+  // The note: the words of a record with them, or of a reading of 0.
+  from = out.size();
+  if (fields == 5) {
+    out.append(12, ' ');
+  } else if (reading == 0 || point.words) {
+    out.append(f[5]);
+    if (fields == 7) out.append(" ").append(f[6]);
+  }
+  out.resize(std::min(out.size(), from + 12));
+  PadBehind(out, from, 12);
+  out.append(" |");
+}
+
+void WriteStation(TextOut& out, const FormWords& w, const Survey& survey,
+                  const StationResult& station, std::span<const ComputedPoint> points,
+                  const std::array<std::string, 7>& nhap) {
+  const SketchTexts& t = station.sketch;
+  const std::string orientation = FixedWidth(station.orientation.name, 12);
+  out.Line("");
+  out.Line(w.sketchNumber + FixedWidth(nhap[1], 6) + std::string(kSketchTitle));
+  out.Line("");
+  out.Line(w.station + FixedWidth(station.station.name, 12) + w.area + FixedWidth(nhap[0], 39));
+  out.Line(w.instrument + FixedWidth(nhap[2], 19) + w.instrumentNumber + FixedWidth(nhap[3], 20));
+  out.Line(w.surveyor + FixedWidth(nhap[4], 17) + w.recorder + FixedWidth(nhap[5], 18) + w.date +
+           FixedWidth(nhap[6], 10));
+  out.Line(w.stationCoordinates + NumberWidth(t.stationX, 11) +
+           "    Y= " + NumberWidth(t.stationY, 10) + "    Z= " + NumberWidth(t.stationZ, 10));
+  out.Line(w.orientation1 + orientation + " X= " + NumberWidth(t.orientationX, 11) + "    Y= " +
+           NumberWidth(t.orientationY, 10) + "    Z= " + NumberWidth(t.orientationZ, 10));
+  out.Line(w.orientation2 + FixedWidth(t.checkName, 12) + " X= " + NumberWidth(t.checkX, 11) +
+           "    Y= " + NumberWidth(t.checkY, 10));
+  out.Line(std::string(kFormWidth, '='));
+  out.Line(w.columnHeads1);
+  out.Line(w.columnHeads2);
+  out.Line(std::string(kFormWidth, '-'));
+
+  for (const ComputedPoint& point : points) {
+    if (point.kind() != PointKind::Detail) continue;
+    AppendDetailRow(out.Buffer(), survey, point);
+    out.EndLine();
+  }
+
+  // The closing row: orientation distance, reading and the orientation point.
+  const std::string reading =
+      "    0 00 " + Mask(DecomposeAngle(t.orientationReading).giay, "00") + " ";
+  out.Line("|      | " + OrientationDistanceText(station.orientationDistance) + " | " + reading +
+           " | " + "            |  " + "           | " + orientation + " |");
+  out.Line(std::string(kFormWidth, '='));
 }
 
 }  // namespace
 
-void insodo(RunState& st) {
-  if (!Ticked(st.fsdo)) return;
-
-  // The reading on the orientation point is shown as 0 00 and a few seconds
-  // drawn at random, as the printed form has always shown it.
-  st.goc = st.rng.Next() * 0.025;
-  GocString(st);
-  const std::string reading = "    0 00 " + Mask(st.giay, "00") + " ";
-
-  const auto& nhap = st.nhap;
-  TextOut& out = st.sdoFile;
-  out.Line("");
-  out.Line(T(kSketchNumber) + FixedWidth(nhap[1], 6) + std::string(kSketchTitle));
-  out.Line("");
-  out.Line(T(kStation) + st.TenTram.str() + T(kArea) + FixedWidth(nhap[0], 39));
-  out.Line(T(kInstrument) + FixedWidth(nhap[2], 19) + T(kInstrumentNumber) +
-           FixedWidth(nhap[3], 20));
-  out.Line(T(kSurveyor) + FixedWidth(nhap[4], 17) + T(kRecorder) + FixedWidth(nhap[5], 18) +
-           T(kDate) + FixedWidth(nhap[6], 10));
-  out.Line(T(kStationCoordinates) + NumberWidth(st.StXTram, 11) +
-           "    Y= " + NumberWidth(st.StYTram, 10) + "    Z= " + NumberWidth(st.StZTram, 10));
-  out.Line(T(kOrientation1) + st.TenDinhHuong.str() + " X= " + NumberWidth(st.StXDinhHuong, 11) +
-           "    Y= " + NumberWidth(st.StYDinhHuong, 10) +
-           "    Z= " + NumberWidth(st.StZDinhHuong, 10));
-  out.Line(T(kOrientation2) + st.TenDinhHuong2.str() + " X= " + NumberWidth(st.StXDinhHuong2, 11) +
-           "    Y= " + NumberWidth(st.StYDinhHuong2, 10));
-  out.Line(std::string(kFormWidth, '='));
-  out.Line(T(kColumnHeads1));
-  out.Line(T(kColumnHeads2));
-  out.Line(std::string(kFormWidth, '-'));
-
-  for (const SketchRow& row : st.MangSoLieuSoDo) out.Line(DetailRow(row));
-
-  // The closing row: orientation distance, reading and the orientation point.
-  out.Line("|      | " + OrientationDistanceText(st.cdhdau) + " | " + reading + " | " +
-           "            |  " + "           | " + st.TenDinhHuong.str() + " |");
-  out.Line(std::string(kFormWidth, '='));
+void WriteSketch(TextOut& out, const Survey& survey, const std::array<std::string, 7>& header) {
+  const FormWords words;
+  std::size_t first = 0;
+  for (std::size_t i = 0; i < survey.stations.size(); ++i) {
+    std::size_t end = first;
+    while (end < survey.points.size() && survey.points[end].station == i) ++end;
+    WriteStation(out, words, survey, survey.stations[i],
+                 std::span<const ComputedPoint>(survey.points).subspan(first, end - first), header);
+    first = end;
+  }
 }
 
 }  // namespace kavu

@@ -3,7 +3,11 @@
 #include <algorithm>
 #include <ctime>
 #include <filesystem>
+#include <functional>
+#include <optional>
 #include <string>
+#include <thread>
+#include <vector>
 
 #include "core/control_points.h"
 #include "core/lookup.h"
@@ -43,33 +47,54 @@ double DistanceTolerance(double scale) {
   return 2.0;
 }
 
-// The working copy, read strictly forward. Reading past its end gives an
-// empty line.
+// The working copy, read strictly forward from the field book's bytes.
+// Reading past its end gives an empty line.
 class WorkingCopy {
  public:
-  explicit WorkingCopy(RunState& st) : st_(st) {}
-  bool AtEnd() const { return next_ >= st_.tamsl.size(); }
-  long long LinesRead() const { return static_cast<long long>(next_); }
-  long long Lines() const { return static_cast<long long>(st_.tamsl.size()); }
+  explicit WorkingCopy(RunState& st) : st_(st), reader_(st.survey.book) {}
+  bool AtEnd() const { return read_ >= st_.workingLines; }
+  long long LinesRead() const { return static_cast<long long>(read_); }
+  long long Lines() const { return static_cast<long long>(st_.workingLines); }
   void ReadLine() {
-    st_.line = AtEnd() ? 0 : st_.tamslLine[next_];
-    // Each line is read once: it leaves the working copy.
-    st_.dong = AtEnd() ? std::string() : std::move(st_.tamsl[next_++]);
-    SplitFields(st_.dong, st_.MangTruong);
+    st_.dongKept = false;
+    std::string_view raw;
+    bool found = false;
+    while (!AtEnd() && !found && reader_.Next(raw)) {
+      ++number_;
+      found = WorkingLine(raw, st_.dong, st_.MangTruong);
+    }
+    if (!found) {
+      st_.line = 0;
+      st_.dong.clear();
+      st_.MangTruong.clear();
+      st_.stp = 0;
+      read_ = st_.workingLines;
+      return;
+    }
+    ++read_;
+    st_.line = number_;
     st_.stp = static_cast<int>(st_.MangTruong.size());
+    // A line that stands in the field book as it reads, up to its line end,
+    // is not kept again.
+    const std::string_view standing = TrimView(raw);
+    if (standing == st_.dong && standing.data() + standing.size() == raw.data() + raw.size()) {
+      st_.dongAt = static_cast<std::uint64_t>(standing.data() - st_.survey.book.data());
+      st_.dongKept = true;
+    }
   }
 
  private:
   RunState& st_;
-  std::size_t next_ = 0;
+  LineReader reader_;
+  std::size_t read_ = 0;
+  std::size_t number_ = 0;
 };
 
 void HandleBodyRecord(RunState& st) {
   const std::size_t stp = st.MangTruong.size();
   auto codeIsPegName = [&] {
-    std::string& code = st.MangTruong[5];
-    const int notDigits = KTraCCG(code);
-    return code.size() > 2 && notDigits == 1;
+    const std::string_view code = TrimView(st.MangTruong[5]);
+    return code.size() > 2 && KTraCCG(code) == 1;
   };
   if (stp == 7) {
     if (Upper(st.MangTruong[6]) == "KT") {
@@ -88,10 +113,9 @@ void HandleBodyRecord(RunState& st) {
   } else if (stp == 5) {
     STP5(st);
   }
-  const std::string name = Trim(st.TenDiem.str());
+  const std::string_view name = TrimView(st.TenDiem.str());
   if (stp < 5 && name != "TR" && name != "DKD") {
-    ReportError(st, std::string(msg::kPoint) + st.TenDiem.str() + std::string(msg::kRunTogether),
-                st.TenDiem.str());
+    ReportPoint(st, st.Field(0).substr(0, decltype(st.TenDiem)::kWidth), msg::kRunTogether);
   }
 }
 
@@ -118,13 +142,19 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
   station.line = recordLine;
   station.instrumentHeight = st.ccm;
   station.backBearing = st.gpv;
-  st.survey.stations.push_back(std::move(station));
   if (Ticked(st.fsdo)) {
-    st.TenDinhHuong2 = "";
-    st.StXDinhHuong2.clear();
-    st.StYDinhHuong2.clear();
-    st.StSaiGoc.clear();
+    station.sketch = {st.StXTram,
+                      st.StYTram,
+                      st.StZTram,
+                      st.StXDinhHuong,
+                      st.StYDinhHuong,
+                      st.StZDinhHuong,
+                      std::string(12, ' '),
+                      {},
+                      {},
+                      0};
   }
+  st.survey.stations.push_back(std::move(station));
   // An orientation record on the last line leaves the station without a body.
   const bool hasBody = !copy.AtEnd();
   copy.ReadLine();
@@ -140,7 +170,9 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
     copy.ReadLine();
     st.TenDiem = st.Field(0);
   }
-  insodo(st);
+  // The reading on the orientation point that the field sketch shows: 0 00
+  // and a few seconds drawn at random, as the printed form has always shown.
+  if (Ticked(st.fsdo)) st.survey.stations.back().sketch.orientationReading = st.rng.Next() * 0.025;
   CheckPegReadings(st, firstPoint);
 }
 
@@ -160,7 +192,7 @@ void SkipStation(RunState& st, WorkingCopy& copy, std::size_t stationLine) {
   const std::string line = std::string(msg::kSkippedFrom) + st.DiemDau.str() +
                            std::string(msg::kSkippedTo) + st.DiemCuoi.str() +
                            std::string(msg::kSkippedEnd);
-  st.survey.report.push_back({line, std::string(), stationLine, false});
+  st.survey.AddReport(line, {}, stationLine, false);
 }
 
 // The coordinates the lookup found, in numbers and as texts; none (and I = 0)
@@ -185,7 +217,6 @@ void TakeLookedUp(RunState& st, double& x, double& y, double& z, std::string& te
 // Station and orientation records of a block; I = 0 when it cannot be computed.
 void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   st.I = 1;
-  st.MangSoLieuSoDo.clear();
   if (st.Field(0).starts_with("TR") && st.stp >= 2) {
     ReportLongName(st, st.Field(1));
     st.TenKC = st.Field(1);
@@ -202,7 +233,8 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   } else {
     st.I = 0;
     ReportError(st,
-                std::string(msg::kPointColon) + st.Field(0) + Utf8ToTcvn3(msg::kStationRunTogether),
+                std::string(msg::kPointColon) + std::string(st.Field(0)) +
+                    Utf8ToTcvn3(msg::kStationRunTogether),
                 st.Field(0));
   }
 
@@ -215,14 +247,11 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
     TakeLookedUp(st, st.xDKD, st.yDKD, st.zDKD, st.StXDinhHuong, st.StYDinhHuong, st.StZDinhHuong);
   } else {
     st.I = 0;
-    ReportError(
-        st, std::string(msg::kPointColon) + st.Field(0) + std::string(msg::kOrientationRunTogether),
-        st.Field(0));
+    ReportError(st,
+                std::string(msg::kPointColon) + std::string(st.Field(0)) +
+                    std::string(msg::kOrientationRunTogether),
+                st.Field(0));
   }
-}
-
-void CommitKeptFile(RunState& st, TextOut& file) {
-  if (file.is_open() && !file.commit()) st.unwritable.push_back(Utf8FromPath(file.path()));
 }
 
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
@@ -242,6 +271,68 @@ void RemoveProduct(const RunState& st, const std::string& path) {
   }
   std::error_code ignored;
   std::filesystem::remove(PathFromUtf8(path), ignored);
+}
+
+// A product of the run: written on one of two threads, then put in place in
+// the order the summary names what could not be written.
+struct Product {
+  TextOut own;              // a product opened at the end of the run
+  TextOut* kept = nullptr;  // or a file kept open through the run
+  std::function<void(TextOut&)> write;
+  std::string failure;                 // its name in the summary when it cannot be written
+  std::optional<std::string> refused;  // it would replace a file the run reads
+  bool commit = true;                  // a kept file is put in place only when it was opened
+  std::size_t weight = 0;              // its share of the writing
+
+  TextOut& File() { return kept != nullptr ? *kept : own; }
+};
+
+Product KeptProduct(TextOut& file, std::size_t weight, std::function<void(TextOut&)> write) {
+  Product product;
+  product.kept = &file;
+  product.commit = file.is_open();
+  product.failure = Utf8FromPath(file.path());
+  product.weight = weight;
+  product.write = std::move(write);
+  return product;
+}
+
+Product NewProduct(const RunState& st, const std::string& path, std::size_t weight,
+                   std::function<void(TextOut&)> write) {
+  Product product;
+  product.refused = OverInput(st, path);
+  if (!product.refused) product.own.open(path);
+  product.failure = path;
+  product.weight = weight;
+  product.write = std::move(write);
+  return product;
+}
+
+// Writes every product, shared out by weight between this thread and
+// another (the heaviest first, each to the one with less to write); each
+// writes only its own files, reading the run's result.
+void WriteProducts(std::vector<Product>& products) {
+  std::vector<Product*> order;
+  for (Product& product : products) {
+    if (!product.refused) order.push_back(&product);
+  }
+  std::stable_sort(order.begin(), order.end(),
+                   [](const Product* a, const Product* b) { return a->weight > b->weight; });
+  std::vector<Product*> here, there;
+  std::size_t hereWeight = 0, thereWeight = 0;
+  for (Product* product : order) {
+    (hereWeight <= thereWeight ? here : there).push_back(product);
+    (hereWeight <= thereWeight ? hereWeight : thereWeight) += product->weight + 1;
+  }
+  const auto write = [](const std::vector<Product*>& share) {
+    for (Product* product : share) {
+      TextOut& file = product->File();
+      if (product->write) product->write(file);
+      file.finish();
+    }
+  };
+  std::jthread other(write, std::cref(there));
+  write(here);
 }
 
 RunResult Finish(RunState& st, RunOutcome outcome) {
@@ -273,6 +364,9 @@ RunResult tinh_Click(RunState& st, Host& host) {
   FileLock jobLock;
   auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
+  // The survey keeps the field book's bytes: its points' records stand there.
+  st.survey.book = std::move(*fieldBook);
+  fieldBook.reset();
 
   st.Tyle = st.TyleTXT;
   st.Htext = st.Htxt;
@@ -286,18 +380,16 @@ RunResult tinh_Click(RunState& st, Host& host) {
   for (const std::string& line : st.conversionReport) ReportError(st, line);
   OpenKeptFile(st, st.cpvFile, st.daufile + ".cpv");
   WriteStationListingHeader(st.cpvFile);
-  if (!DocFileKhongChe(st, host, *fieldBook)) {
+  if (!DocFileKhongChe(st, host, st.survey.book)) {
     AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
-  // The working copy holds all the run reads of the field book from here on.
-  fieldBook.reset();
   WritePegFileHead(st);
   st.survey.controlListing.clear();
   st.listedNames.clear();
   // The working copy holds no station record the loop could reach (control
   // records only, one line, one endless line).
-  if (st.tamsl.empty()) {
+  if (st.workingLines == 0) {
     host.MessageBox(msg::kNoDetailData, MsgIcon::Critical, MsgButtons::Ok);
     st.txtfile.clear();
     host.SetFileBox("");
@@ -306,6 +398,11 @@ RunResult tinh_Click(RunState& st, Host& host) {
     return Finish(st, RunOutcome::StoppedEarly);
   }
 
+  // Room for a point and a report line a line: the vectors never move what
+  // they hold, and the room not used is never touched.
+  st.survey.points.reserve(st.workingLines);
+  st.survey.stations.reserve(st.stationRecords);
+  st.survey.report.reserve(st.survey.report.size() + st.workingLines);
   Counters counters;
   WorkingCopy copy(st);
   copy.ReadLine();
@@ -319,9 +416,6 @@ RunResult tinh_Click(RunState& st, Host& host) {
       SkipStation(st, copy, stationLine);
     }
   }
-  // Every line of the working copy has been read.
-  st.tamsl = {};
-  st.tamslLine = {};
   // Stopped by the user: as a run that stops early, nothing is written.
   if (host.Cancelled()) {
     AbandonKeptFiles(st);
@@ -331,23 +425,61 @@ RunResult tinh_Click(RunState& st, Host& host) {
   }
 
   // A run without errors leaves no error report and no station listing.
+  // The products' weights: their time a point as measured (sketch rows and
+  // drawing entities take the longest).
+  const Survey& survey = st.survey;
+  const std::size_t details = survey.points.size();
+  std::vector<Product> products;
   if (st.err == 0) {
     st.errFile.abandon();
     st.cpvFile.abandon();
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
-    WriteStationListing(st.cpvFile, st.survey);
-    CommitKeptFile(st, st.cpvFile);
-    WriteErrorReport(st.errFile, st.survey.report);
-    CommitKeptFile(st, st.errFile);
+    products.push_back(KeptProduct(st.cpvFile, survey.stations.size(),
+                                   [&](TextOut& out) { WriteStationListing(out, survey); }));
+    products.push_back(KeptProduct(st.errFile, survey.report.size(),
+                                   [&](TextOut& out) { WriteErrorReport(out, survey); }));
   }
-  WriteTextProducts(st);
-  if (Ticked(st.fdxf) && !ProductOverInput(st, st.daufile + ".dxf") && !indxf(st)) {
-    st.unwritable.push_back(st.daufile + ".dxf");
+  if (Ticked(st.fkc)) {
+    products.push_back(NewProduct(st, st.daufile + ".kc", survey.controlListing.size(),
+                                  [&](TextOut& out) { WriteControlListing(out, survey); }));
   }
-  if (Ticked(st.fcp)) WritePegBlocks(st.cpFile, st.survey);
-  CommitKeptFile(st, st.cpFile);
-  CommitKeptFile(st, st.sdoFile);
+  if (Ticked(st.fasc)) {
+    std::error_code ignored;
+    std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
+    for (const bool coordinates : {false, true}) {
+      products.push_back(NewProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1,
+                                    (coordinates ? 2 : 1) * details,
+                                    [&, coordinates](TextOut& out) {
+                                      WriteControlListing(out, survey);
+                                      WriteStationRecords(out, survey, coordinates);
+                                    }));
+    }
+  }
+  if (Ticked(st.ftd)) {
+    const int decimals = HeightDecimals(st.txtSoleDC);
+    products.push_back(
+        NewProduct(st, st.daufile + ".txt", 2 * details,
+                   [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
+  }
+  if (Ticked(st.fdxf)) {
+    products.push_back(NewProduct(st, st.daufile + ".dxf", 4 * details,
+                                  [&](TextOut& out) { WriteDrawing(out, st); }));
+  }
+  products.push_back(KeptProduct(st.cpFile, survey.stations.size(), [&](TextOut& out) {
+    if (Ticked(st.fcp)) WritePegBlocks(out, survey);
+  }));
+  products.push_back(KeptProduct(st.sdoFile, 6 * details, [&](TextOut& out) {
+    if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
+  }));
+  WriteProducts(products);
+  for (Product& product : products) {
+    if (product.refused) {
+      st.unwritable.push_back(*product.refused);
+    } else if (product.commit && !product.File().commit()) {
+      st.unwritable.push_back(product.failure);
+    }
+  }
   if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");
 
   jobLock.Release();

@@ -93,12 +93,12 @@ void PaintLabel(QPainter& painter, QPointF at, const QString& text, const QColor
 QString FromTcvn3(std::string_view text) { return QString::fromStdString(Tcvn3ToUtf8(text)); }
 
 MapModel BuildMap(const Survey& survey) {
-  std::set<std::string> named;
+  std::set<std::string, std::less<>> named;
   for (const ReportEntry& entry : survey.report) {
-    if (!entry.point.empty()) named.insert(entry.point);
+    if (entry.size > 0) named.emplace(survey.Point(entry));
   }
   MapModel model;
-  auto add = [&](MapKind kind, const std::string& name, double x, double y, std::size_t index,
+  auto add = [&](MapKind kind, std::string_view name, double x, double y, std::size_t index,
                  std::size_t line) {
     MapItem item{kind, FromTcvn3(name), {}, x, y, named.contains(name), index, line};
     model.items.push_back(std::move(item));
@@ -115,8 +115,9 @@ MapModel BuildMap(const Survey& survey) {
   }
   for (std::size_t i = 0; i < survey.points.size(); ++i) {
     const ComputedPoint& p = survey.points[i];
-    add(p.kind == PointKind::Peg ? MapKind::Peg : MapKind::Detail, p.name, p.x, p.y, i, p.line);
-    model.items.back().code = FromTcvn3(p.code);
+    add(p.kind() == PointKind::Peg ? MapKind::Peg : MapKind::Detail, survey.Name(p), p.x, p.y, i,
+        p.line);
+    model.items.back().code = FromTcvn3(survey.Code(p));
   }
   bool first = true;
   for (const MapItem& item : model.items) {

@@ -166,7 +166,7 @@ std::string MapWindow::nameOf(const MapItem& item) const {
     case MapKind::Detail:
       break;
   }
-  return survey_.points[item.index].name;
+  return std::string(survey_.Name(survey_.points[item.index]));
 }
 
 std::string MapWindow::bookLine(std::size_t line) {
@@ -183,10 +183,10 @@ QString MapWindow::describe(std::size_t index) {
   const std::string name = nameOf(item);
   bool heading = false;
   for (const ReportEntry& entry : survey_.report) {
-    if (entry.point != name) continue;
+    if (survey_.Point(entry) != name) continue;
     if (!heading) text << Q(kReportLines);
     heading = true;
-    text << QStringLiteral("  ") + FromTcvn3(entry.text);
+    text << QStringLiteral("  ") + FromTcvn3(survey_.TextOf(entry));
   }
   // The records of the point: a peg that later served as a station has two.
   std::set<std::size_t> lines;

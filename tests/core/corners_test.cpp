@@ -3,6 +3,7 @@
 // worked out by hand from the rule, not taken from a run.
 #include <gtest/gtest.h>
 
+#include <cmath>
 #include <filesystem>
 #include <regex>
 #include <sstream>
@@ -11,6 +12,9 @@
 #include <vector>
 
 #include "cli/cli.h"
+#include "core/messages.h"
+#include "core/station.h"
+#include "core/tcvn3.h"
 #include "tests/support.h"
 
 namespace kavu {
@@ -56,76 +60,102 @@ std::string Book(std::string_view body) {
   return std::string(kControl) + std::string(kStation) + std::string(body);
 }
 
-// The orientation distance is checked against the map scale's tolerance:
-// 0.02 m up to 1:500, 0.05 m to 1:2000, 0.3 m below 1:5000, 2 m beyond; a
-// difference equal to the tolerance is reported.
-TEST(Corners, OrientationDistanceToleranceOfEveryScale) {
+// A book's corner and what its products must show; the error report is
+// compared whole after its head. Orientation distance against the scale's
+// tolerance: 0.02 m up to 1:500, 0.05 m to 1:2000, 0.3 m below 1:5000, 2 m
+// beyond, a difference equal to it reported. Entry checks (name in 12
+// columns): 1234560 has 60 seconds; 1234559.9 rounds to the whole 1234560 for
+// minutes but keeps 59.9 seconds; over 2000 m is checked by the height and
+// again by the position. Values below 1 m are written without a 0 before the
+// point; the reading 1.45 (0 00 01.45) is decoded as 1.45 x 100.00001 =
+// 1.5000... seconds, shown as the even 02; reading about 0 points at the
+// orientation, due south: X = 1000 - 0.5, H = 10 + 1.5 - 0.5. The .txt
+// heights (11.5 and, prism -1.25, 12.75) to the typed decimals, ties to even,
+// no trailing zeros, a negative count as 0.
+TEST(Corners, BooksAndWhatTheirProductsShow) {
   struct Case {
-    const char* scale;
-    const char* measured;
-    const char* ds;  // the report's difference, or nullptr
+    std::vector<std::string> options;
+    std::string body;
+    std::string report;  // the error report after its head; "" when it has none
+    std::vector<std::pair<std::string, std::string>> shown = {};  // product, text
   };
-  for (const Case& c : {Case{"500", "100.03", " .03 "}, Case{"501", "100.03", nullptr},
-                        Case{"2000", "100.06", " .06 "}, Case{"2001", "100.06", nullptr},
-                        Case{"4999", "100.4", " .4 "}, Case{"5000", "100.4", nullptr},
-                        Case{"5000", "102", " 2 "}, Case{"5000", "97.5", "-2.5 "}}) {
-    const Outcome run = Compute(Book(std::string("X1 0 ") + c.measured + " 900000 1.5 KC2\r\n" +
-                                     "1 900000 10 900000 1.5\r\n"),
-                                {"--scale", c.scale});
+  const std::string tolerance = "X1 0 %s 900000 1.5 KC2\r\n1 900000 10 900000 1.5\r\n";
+  const auto measured = [&](const char* distance) {
+    return std::regex_replace(tolerance, std::regex("%s"), distance);
+  };
+  const auto ds = [](const char* text) {
+    return "\r\nTram KC1         " + Utf8ToTcvn3(msg::kOrientation) +
+           "KC2         Sai canh dinh huong DS= " + text + "\r\n";
+  };
+  const std::string heights = "A 0 10 900000 0\r\nB 0 10 900000 -1.25\r\n";
+  const Case cases[] = {
+      {{"--scale", "500"}, measured("100.03"), ds(" .03 ")},
+      {{"--scale", "501"}, measured("100.03"), ""},
+      {{"--scale", "2000"}, measured("100.06"), ds(" .06 ")},
+      {{"--scale", "2001"}, measured("100.06"), ""},
+      {{"--scale", "4999"}, measured("100.4"), ds(" .4 ")},
+      {{"--scale", "5000"}, measured("100.4"), ""},
+      {{"--scale", "5000"}, measured("102"), ds(" 2 ")},
+      {{"--scale", "5000"}, measured("97.5"), ds("-2.5 ")},
+      {{}, "S 1234560 10 900000 1.5\r\n", "\r\nDiem S            nhap sai phan giay\r\n"},
+      {{}, "S 1234559.9 10 900000 1.5\r\n", ""},
+      {{}, "S 1234599.6 10 900000 1.5\r\n", ""},  // -0.4 seconds carried into 46 minutes
+      {{}, "S 1236000 10 900000 1.5\r\n", "\r\nDiem S            nhap sai phan phut\r\n"},
+      {{}, "S 0 10 0895960 1.5\r\n", "\r\nDiem S            nhap sai phan giay\r\n"},
+      {{}, "S 0 2000 900000 1.5\r\n", ""},
+      {{},
+       "S 0 2000.01 900000 1.5\r\n",
+       "\r\nDiem S            co the nhap sai canh\r\n\r\nDiem S            co the nhap sai "
+       "canh\r\n"},
+      {{"--asc", "--sketch"},
+       "A 1.45 0.5 900000 0.5\r\n",
+       "",
+       {{".td1", "A         999.500    1000.000      11.000      .500\r\n"},
+        {".sdo", "|A     |     .500 |     0 00 02  |"}}},
+      {{"--txt"}, heights, "", {{".txt", "       11.5  \r\n"}, {".txt", "      12.75  \r\n"}}},
+      {{"--txt", "--height-decimals", "1"},
+       heights,
+       "",
+       {{".txt", "       11.5  \r\n"}, {".txt", "       12.8  \r\n"}}},
+      {{"--txt", "--height-decimals", "0"},
+       heights,
+       "",
+       {{".txt", "         12  \r\n"}, {".txt", "         13  \r\n"}}},
+      {{"--txt", "--height-decimals", "-1"}, heights, "", {{".txt", "         13  \r\n"}}},
+  };
+  for (const Case& c : cases) {
+    const Outcome run = Compute(Book(c.body), c.options);
     const std::string err = run.Product(".err");
-    if (c.ds == nullptr) {
-      EXPECT_EQ(run.code, kExitOk) << c.scale << " " << c.measured << err;
-    } else {
-      EXPECT_EQ(run.code, kExitDataErrors);
-      EXPECT_NE(err.find(std::string("Sai canh dinh huong DS= ") + c.ds + "\r\n"),
-                std::string::npos)
-          << c.scale << " " << c.measured << err;
+    SCOPED_TRACE(c.body + err);
+    EXPECT_EQ(run.code, c.report.empty() ? kExitOk : kExitDataErrors);
+    if (!c.report.empty()) {
+      EXPECT_EQ(err.substr(err.find("-\r\n") + 3), c.report);
+    }
+    for (const auto& [product, text] : c.shown) {
+      EXPECT_NE(run.Product(product).find(text), std::string::npos) << product << " " << text;
     }
   }
 }
 
-// Entry checks of a packed angle and a distance, and the report line each
-// gives (name in 12 columns). 1234560 has 60 seconds; 1234559.9 rounds to
-// the whole 1234560 for minutes but keeps 59.9 seconds; a distance over
-// 2000 m is checked by the height and again by the position.
-TEST(Corners, EntryChecksOfAnglesAndDistances) {
-  struct Case {
-    const char* record;
-    const char* report;  // the error report's lines after its header
-  };
-  const std::string seconds = "\r\nDiem S            nhap sai phan giay\r\n";
-  for (const Case& c : {
-           Case{"S 1234560 10 900000 1.5", "\r\nDiem S            nhap sai phan giay\r\n"},
-           Case{"S 1234559.9 10 900000 1.5", ""},
-           Case{"S 1236000 10 900000 1.5", "\r\nDiem S            nhap sai phan phut\r\n"},
-           Case{"S 0 10 0895960 1.5", "\r\nDiem S            nhap sai phan giay\r\n"},
-           Case{"S 0 2000 900000 1.5", ""},
-           Case{"S 0 2000.01 900000 1.5",
-                "\r\nDiem S            co the nhap sai canh\r\n"
-                "\r\nDiem S            co the nhap sai canh\r\n"},
-       }) {
-    const Outcome run = Compute(Book(std::string(c.record) + "\r\n"));
-    const std::string err = run.Product(".err");
-    if (*c.report == '\0') {
-      EXPECT_EQ(run.code, kExitOk) << c.record << err;
-    } else {
-      const std::size_t body = err.find("-\r\n");
-      ASSERT_NE(body, std::string::npos) << c.record << err;
-      EXPECT_EQ(err.substr(body + 3), c.report) << c.record;
-    }
+// The azimuth is held in single precision, so exact quarter turns come out a
+// few millionths of a degree off, as the office's products always showed.
+TEST(Corners, SinglePrecisionAzimuthsAndDistance) {
+  RunState st;
+  st.xTR = st.yTR = 1000;
+  for (const auto& [x, y, azimuth] :
+       {std::tuple{900.0, 1000.0, 0.0}, std::tuple{1000.0, 900.0, 90.0000025},
+        std::tuple{1000.0, 1100.0, 270.0000007}, std::tuple{1100.0, 1000.0, 180.000005},
+        std::tuple{900.0, 900.0, 45.0000013}}) {
+    st.xDKD = x;
+    st.yDKD = y;
+    TinhPhuongViCanh(st);
+    EXPECT_NEAR(st.gpv, azimuth, 1e-7) << x << " " << y;
   }
-}
-
-// A station whose orientation point lies more than 10 km away is reported;
-// exactly 10 km is not.
-TEST(Corners, CoordinatesMoreThanTenKilometresApart) {
-  for (const auto& [x, reported] : {std::pair{"11000", false}, std::pair{"11000.5", true}}) {
-    const Outcome run = Compute(std::string("TR KC1 1000 1000 10\r\nTR F ") + x +
-                                " 1000 10\r\nTR KC1 1.5\r\nDKD F\r\n1 0 10 900000 1.5\r\n");
-    const bool found = run.Product(".err").find(
-                           "Diem: KC1          hoac F            SAI TOA DO!") != std::string::npos;
-    EXPECT_EQ(found, reported) << x;
-  }
+  EXPECT_DOUBLE_EQ(st.cdh, 100 * std::sqrt(2.0));
+  // Radians from degrees with pi to 15 digits, as every angle of the book.
+  st.goc = 1800000;
+  gocdo(st);
+  EXPECT_EQ(st.rad, 3.14159265358979);
 }
 
 // The check record on KC3. Orientation azimuth (KC2 to KC1) 0; azimuth from
@@ -153,35 +183,6 @@ TEST(Corners, CheckReadingKeptOrMadeUpWithinHalfAMinute) {
     EXPECT_TRUE(std::regex_search(pegs, std::regex("\r\n" + std::string(c.line) + "\r\n")))
         << c.orientation << " " << c.reading << "\n"
         << pegs;
-  }
-}
-
-// Values below 1 m are written without a 0 before the point (the masks
-// "####.000" and "#####.000"). The reading 1.45 (0 00 01.45) is decoded as
-// 1.45 x 100.00001 = 1.5000... seconds, which the sketch shows as the even 02.
-// Reading about 0 points at the orientation, due south: X = 1000 - 0.5;
-// H = 10 + 1.5 - 0.5.
-TEST(Corners, ValuesBelowOneMetreAndTheDecodedSeconds) {
-  const Outcome run = Compute(Book("A 1.45 0.5 900000 0.5\r\n"), {"--asc", "--sketch"});
-  EXPECT_NE(run.Product(".td1").find("A         999.500    1000.000      11.000      .500\r\n"),
-            std::string::npos)
-      << run.Product(".td1");
-  EXPECT_NE(run.Product(".sdo").find("|A     |     .500 |     0 00 02  |"), std::string::npos)
-      << run.Product(".sdo");
-}
-
-// The coordinate text file's heights: rounded to the typed number of
-// decimals, ties to even, no trailing zeros; a negative count is 0.
-TEST(Corners, HeightDecimalsOfTheCoordinateTextFile) {
-  // H = 10 + 1.5 - 0 = 11.5 and 10 + 1.5 + 1.25 = 12.75 (prism -1.25).
-  const std::string book = Book("A 0 10 900000 0\r\nB 0 10 900000 -1.25\r\n");
-  for (const auto& [decimals, a, b] :
-       {std::tuple{"2", "      11.5", "     12.75"}, std::tuple{"1", "      11.5", "      12.8"},
-        std::tuple{"0", "        12", "        13"},
-        std::tuple{"-1", "        12", "        13"}}) {
-    const std::string txt = Compute(book, {"--txt", "--height-decimals", decimals}).Product(".txt");
-    EXPECT_NE(txt.find(std::string(" ") + a + "  \r\n"), std::string::npos) << decimals << txt;
-    EXPECT_NE(txt.find(std::string(" ") + b + "  \r\n"), std::string::npos) << decimals << txt;
   }
 }
 

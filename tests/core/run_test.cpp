@@ -86,25 +86,24 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
       reportLines.push_back(line.substr(0, line.size() - 1));
   }
   std::vector<std::string> entries;
-  for (const ReportEntry& entry : survey.report) entries.push_back(entry.text);
+  for (const ReportEntry& entry : survey.report) entries.push_back(survey.TextOf(entry));
   EXPECT_EQ(entries, reportLines);
   ASSERT_FALSE(survey.report.empty());
-  EXPECT_EQ(survey.report.front().point, "JUNK");
+  EXPECT_EQ(survey.Point(survey.report.front()), "JUNK");
   EXPECT_EQ(survey.report.front().line, 4u);
 
+  // Each detail point at the coordinates of the coordinate text file.
   std::istringstream txt(FileBytes(kEveryRecord / "expected" / "job.txt"));
   std::size_t k = 0;
-  for (std::string line; std::getline(txt, line);) {
-    while (k < survey.points.size() && survey.points[k].kind != PointKind::Detail) ++k;
+  for (std::string line; std::getline(txt, line); ++k) {
+    while (k < survey.points.size() && survey.points[k].kind() != PointKind::Detail) ++k;
     ASSERT_LT(k, survey.points.size()) << line;
-    const ComputedPoint& point = survey.points[k++];
     std::istringstream fields(line.substr(5));
     double x = 0, y = 0;
     fields >> x >> y;
-    EXPECT_EQ(point.name.substr(0, 5), Trim(line.substr(0, 5)));
-    EXPECT_EQ(point.x, x) << line;
-    EXPECT_EQ(point.y, y) << line;
-    EXPECT_LT(point.station, survey.stations.size());
+    EXPECT_EQ(survey.Name(survey.points[k]).substr(0, 5), Trim(line.substr(0, 5)));
+    EXPECT_EQ(survey.points[k].x, x) << line;
+    EXPECT_EQ(survey.points[k].y, y) << line;
   }
   ASSERT_EQ(survey.stations.size(), 6u);
   EXPECT_EQ(survey.stations[0].station.name, "KC1");
@@ -119,161 +118,9 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_TRUE(survey.stations[0].checkResidual);
   std::vector<std::string> pegs;
   for (const ComputedPoint& point : survey.points) {
-    if (point.kind == PointKind::Peg) pegs.push_back(point.name);
+    if (point.kind() == PointKind::Peg) pegs.emplace_back(survey.Name(point));
   }
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
-}
-
-// The regenerated field book is itself a field book: computing it again
-// gives the same coordinates.
-TEST(Run, RegeneratedFieldBookComputesToTheSameCoordinates) {
-  const fs::path folder = FreshFolder();
-  fs::create_directories(folder / "a");
-  fs::copy_file(kEveryRecord / "job.asc", folder / "a" / "job.asc");
-  RunState first = StateFor(folder / "a" / "job.asc");
-  first.fasc = first.ftd = 1;
-  RecordingHost host;
-  tinh_Click(first, host);
-
-  fs::create_directories(folder / "b");
-  fs::copy_file(folder / "TRIDO" / "job.asc", folder / "b" / "job.asc");
-  RunState second = StateFor(folder / "b" / "job.asc");
-  second.ftd = 1;
-  tinh_Click(second, host);
-  // The skipped stations and rejected lines are gone, so only the computed
-  // points are compared.
-  EXPECT_EQ(FileBytes(folder / "b" / "job.txt"), FileBytes(folder / "a" / "job.txt"));
-}
-
-TEST(Run, CleanRunRemovesItsReportsAndTheEditorBackup) {
-  const fs::path folder = FreshFolder();
-  WriteBytes(
-      folder / "job.asc",
-      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "job.bak", "old\r\n");
-  RunState st = StateFor(folder / "job.asc");
-  RecordingHost host;
-  const RunResult result = tinh_Click(st, host);
-  EXPECT_EQ(result.outcome, RunOutcome::Completed);
-  EXPECT_EQ(result.err, 0);
-  for (const char* name : {"job.err", "job.cpv", "job.bak"}) {
-    EXPECT_FALSE(fs::exists(folder / name)) << name;
-  }
-  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
-}
-
-TEST(Run, UserErrorsStopTheRunWithTheirMessage) {
-  const fs::path folder = FreshFolder();
-  RecordingHost host;
-
-  // Every refused choice leaves the file box empty with the focus in it, so
-  // the user can type the next name at once.
-  RunState none;
-  host.fileBox = "typed";
-  EXPECT_EQ(tinh_Click(none, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), msg::kNoFileChosen);
-  EXPECT_EQ(host.fileBox, "");
-
-  RunState missing = StateFor(folder / "nothing.asc");
-  host.fileBox = "x";
-  EXPECT_EQ(tinh_Click(missing, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) +
-                                      (folder / "nothing.asc").string() + "\r" +
-                                      std::string(msg::kEnterNewFile));
-  EXPECT_EQ(host.fileBox, "");
-  EXPECT_EQ(missing.txtfile, "");
-
-  WriteBytes(folder / "empty.asc", "");
-  RunState empty = StateFor(folder / "empty.asc");
-  EXPECT_EQ(tinh_Click(empty, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(),
-            std::string(msg::kFileSizeZero) + "\r" + std::string(msg::kCheckFileAgain));
-  EXPECT_EQ(empty.txtfile, "");
-  EXPECT_EQ(host.focused, 3);
-
-  // A kind without converter needs the field book of the same base name.
-  WriteBytes(folder / "job.raw", "raw data\r\n");
-  RunState raw = StateFor(folder / "job.raw");
-  EXPECT_EQ(tinh_Click(raw, host).outcome, RunOutcome::NotStarted);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kFileNotFound) + (folder / "job.asc").string() +
-                                      "\r" + std::string(msg::kEnterNewFile));
-  EXPECT_FALSE(fs::exists(folder / "job.err"));
-
-  // Only control points: the run stops and writes nothing.
-  WriteBytes(folder / "kc.asc", "TR A 1 2 3\r\n\r\n   \r\n");
-  RunState onlyControl = StateFor(folder / "kc.asc");
-  EXPECT_EQ(tinh_Click(onlyControl, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), msg::kNoDetailData);
-  EXPECT_FALSE(fs::exists(folder / "kc.err"));
-}
-
-TEST(Run, CommonControlFileReplacesTheFieldBooksControlPoints) {
-  const fs::path folder = FreshFolder();
-  WriteBytes(folder / "job.asc",
-             "TR A 5 5 5\r\nTR B 6 6 6\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "common.kc", "header line\r\nTR A 1000 1000 10\r\nTR B 900 1000\r\n");
-  RecordingHost host;
-
-  RunState st = StateFor(folder / "job.asc");
-  st.ckKC = 1;
-  st.txtFKC = "  " + (folder / "common.kc").string() + " ";
-  EXPECT_EQ(tinh_Click(st, host).outcome, RunOutcome::Completed);
-  EXPECT_EQ(FileBytes(folder / "job.txt"), "1     1000.000    900.000            10  \r\n");
-
-  RunState unnamed = StateFor(folder / "job.asc");
-  unnamed.ckKC = 1;
-  unnamed.txtFKC = "   ";
-  EXPECT_EQ(tinh_Click(unnamed, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), msg::kNoControlFile);
-
-  RunState unreadable = StateFor(folder / "job.asc");
-  unreadable.ckKC = 1;
-  unreadable.txtFKC = (folder / "gone.kc").string();
-  EXPECT_EQ(tinh_Click(unreadable, host).outcome, RunOutcome::StoppedEarly);
-  EXPECT_EQ(host.messages.back(), std::string(msg::kCannotOpen) + (folder / "gone.kc").string());
-}
-
-TEST(Run, UnwritableProductIsNamedAndTheOthersAreWritten) {
-  const fs::path folder = FreshFolder();
-  fs::create_directories(folder / "data");
-  WriteBytes(
-      folder / "data" / "job.asc",
-      "TR A 1000 1000 10\r\nTR B 900 1000 12\r\nTR A 1.5\r\nDKD B\r\n1 900000 100 900000 1.5\r\n");
-  WriteBytes(folder / "TRIDO", "a file where the folder should be");
-  RunState st = StateFor(folder / "data" / "job.asc");
-  st.fasc = st.ftd = 1;
-  RecordingHost host;
-  const RunResult result = tinh_Click(st, host);
-  ASSERT_EQ(result.unwritable.size(), 1u);
-  EXPECT_EQ(result.unwritable[0], st.filesl1);
-  EXPECT_TRUE(fs::exists(folder / "data" / "job.td1"));
-  EXPECT_TRUE(fs::exists(folder / "data" / "job.txt"));
-  EXPECT_NE(host.messages.back().find(std::string(msg::kCannotWrite) + st.filesl1 + "\r"),
-            std::string::npos);
-}
-
-// Whatever the bytes, the run ends with its summary.
-TEST(Run, HostileBytesEndWithASummary) {
-  const fs::path folder = FreshFolder();
-  const std::string head = "TR A 1000 1000 10\nTR B 900 1000 12\rTR A 1.5\r\nDKD B\n";
-  std::string binary;
-  for (int i = 0; i < 4096; ++i) binary += static_cast<char>((i * 131 + 7) % 256);
-  const std::string cases[] = {
-      head + "1 900000 100 900000 1.5",                              // no final line end
-      head + std::string("1 9\0 100 900000 1.5\r\n", 21),            // NUL inside a number
-      head + "2 0 1 90 1 " + std::string(10'000'000, 'x') + "\r\n",  // a 10 MB word
-      head + binary,                                                 // binary data
-      head + "\xa7\x81\xff 0 1 900000 1 \x80\r\n1e999 1e999 1e999 1e999 1e999\r\n",
-      head + "TR 1e308 1e308 1e308 1e308\r\nTR 1e308 1.5\r\nDKD B\r\n3 1e300 1e300 1e300 1\r\n",
-  };
-  RecordingHost host;
-  for (const std::string& bytes : cases) {
-    WriteBytes(folder / "job.asc", bytes);
-    RunState st = StateFor(folder / "job.asc");
-    st.fasc = st.ftd = st.fkc = 1;
-    const RunResult result = tinh_Click(st, host);
-    EXPECT_EQ(result.outcome, RunOutcome::Completed) << bytes.substr(0, 80);
-  }
 }
 
 }  // namespace

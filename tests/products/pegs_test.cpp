@@ -4,6 +4,7 @@
 
 #include "core/host.h"
 #include "core/station.h"
+#include "core/tcvn3.h"
 #include "run/run.h"
 #include "tests/products/product_files.h"
 
@@ -39,11 +40,8 @@ void Station(RunState& st, const std::string& tram, const std::string& dinhHuong
   st.survey.stations.push_back(station);
   const std::size_t first = st.survey.points.size();
   for (const std::string& record : pegs) {
-    ComputedPoint point;
-    point.kind = PointKind::Peg;
-    point.station = st.survey.stations.size() - 1;
-    point.record = record;
-    st.survey.points.push_back(point);
+    st.survey.AddPoint(record, PointKind::Peg, 0, 0).station =
+        static_cast<std::uint32_t>(st.survey.stations.size() - 1);
   }
   CheckPegReadings(st, first);
 }
@@ -90,101 +88,45 @@ TEST(Pegs, HeadAndStationBlocks) {
   ASSERT_TRUE(st.cpFile.close());
   EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/stations.cp"));
   ASSERT_EQ(st.survey.report.size(), 2u);
-  EXPECT_EQ(st.survey.report[0].text, "Diem M7           nhap sai phan do");
-  EXPECT_EQ(st.survey.report[1].text, "Diem M9           nhap sai phan do");
+  EXPECT_EQ(st.survey.TextOf(st.survey.report[0]), "Diem M7           nhap sai phan do");
+  EXPECT_EQ(st.survey.TextOf(st.survey.report[1]), "Diem M9           nhap sai phan do");
 }
 
-TEST(Pegs, HeadWithoutHeights) {
+// A seeded run writes the three products of a field book with every line
+// form: station 1 has detail points with 5, 6 and 7 fields (0-angle points
+// with words, a 13-character name, a note longer than 12), a peg and a check
+// record without a reading (made up from the draw); station 2 a check record
+// with its reading and two pegs; station 3 only an orientation distance
+// record, so no detail rows and no pegs. The draws follow the run order: check
+// record, then the station's sketch row.
+TEST(ProductsRun, SeededRunWritesSketchPegsAndDrawing) {
   const auto folder = FreshFolder();
-  RunState st = PegState(folder, 1, 0);
-  WritePegFileHead(st);
-  ASSERT_TRUE(st.cpFile.close());
-  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), Expected("pegs/head_without_heights.cp"));
-}
-
-// Without the box ticked nothing is written and nothing is checked.
-TEST(Pegs, NothingWhenNotTicked) {
-  const auto folder = FreshFolder();
-  RunState st = PegState(folder, 0, 1);
-  WritePegFileHead(st);
-  Station(st, "ST1", "DH1", "DKD2 KT2", {Peg("M7", "12345305", "12", "900000", "1.5", "")});
-  ASSERT_TRUE(st.cpFile.close());
-  EXPECT_EQ(FileBytes(folder / "JOB1.cp"), "");
-  EXPECT_EQ(st.err, 0);
-}
-
-RunState RunOn(const std::filesystem::path& fieldBook) {
+  std::filesystem::copy_file(std::filesystem::path(KAVU_TEST_DATA) / "products/run/job.asc",
+                             folder / "JOB.asc");
   RunState st;
-  st.txtfile = fieldBook.string();
+  st.txtfile = (folder / "JOB.asc").string();
   st.ftd = 0;
   st.fdc = 1;
+  st.fsdo = 1;
   st.fcp = 1;
-  st.seed = 1;
-  return st;
-}
-
-// The peg file of one run serves the next: as the common control-point file
-// its head gives the known points, and as a field book its station blocks
-// give each peg again as a detail point, at the coordinates the peg got.
-TEST(Pegs, PegFileIsReadBackByTheNextRun) {
-  const auto folder = FreshFolder();
-  const auto book = folder / "JOB1.asc";
-  testing::WriteBytes(book,
-                      "TR ST1 2345678.123 567890.456 12.5\r\n"
-                      "TR DH1 2345578.123 567890.456 10.0\r\n"
-                      "TR ST1 1.45\r\n"
-                      "DKD DH1\r\n"
-                      "1 1234530 45.6 900000 1.5\r\n"
-                      "2 2700000 30.25 900000 1.5 CP5\r\n"
-                      "TR CP5 1.5\r\n"
-                      "DKD ST1\r\n"
-                      "3 1800000 20 900000 1.5\r\n");
+  st.fdxf = 1;
+  st.seed = 7;
+  st.nhapsdo = {Utf8ToTcvn3("Xã Hòa Bình, huyện Đông Anh"),
+                "05",
+                "SET 2C",
+                "123456",
+                Utf8ToTcvn3("Nguyễn Văn A"),
+                Utf8ToTcvn3("Trần Thị B"),
+                "06/12/2026"};
   QuietHost host;
-  RunState first = RunOn(book);
-  const RunResult firstRun = tinh_Click(first, host);
-  ASSERT_EQ(firstRun.outcome, RunOutcome::Completed);
-  ASSERT_EQ(first.err, 0);
-  ASSERT_EQ(first.sdkc(), 3);  // ST1, DH1 and the peg CP5
-  const KnownPoint peg = first.MangKhongChe[2];
-  ASSERT_EQ(Trim(peg[0]), "CP5");
-  const std::string cp = FileBytes(folder / "JOB1.cp");
-  EXPECT_EQ(cp,
-            "TR ST1          2345678.123 567890.456 12.5      \r\n"
-            "TR DH1          2345578.123 567890.456 10.0      \r\n"
-            "TR ST1         \r\n"
-            "DKD1 DH1         \r\n"
-            " CP5          2700000   30.25  900000 1.5 \r\n");
-
-  // As the common control-point file of a run on the same observations.
-  const auto again = folder / "JOB2.asc";
-  testing::WriteBytes(again, "TR ST1 1.45\r\nDKD DH1\r\n1 1234530 45.6 900000 1.5\r\n");
-  RunState second = RunOn(again);
-  second.ckKC = 1;
-  second.txtFKC = (folder / "JOB1.cp").string();
-  const RunResult secondRun = tinh_Click(second, host);
-  ASSERT_EQ(secondRun.outcome, RunOutcome::Completed);
-  EXPECT_EQ(second.err, 0);
-  ASSERT_EQ(secondRun.survey.points.size(), 1u);
-  EXPECT_EQ(secondRun.survey.points[0].x, firstRun.survey.points[0].x);
-  EXPECT_EQ(secondRun.survey.points[0].y, firstRun.survey.points[0].y);
-  EXPECT_EQ(secondRun.survey.points[0].z, firstRun.survey.points[0].z);
-
-  // As a field book: the peg comes back as a detail point at its place. The
-  // block's station line carries no instrument height, which the run reports,
-  // so the height comes out lower by the 1.45 m of the first run.
-  const auto asBook = folder / "JOB3.asc";
-  testing::WriteBytes(asBook, cp);
-  RunState third = RunOn(asBook);
-  const RunResult thirdRun = tinh_Click(third, host);
-  ASSERT_EQ(thirdRun.outcome, RunOutcome::Completed);
-  EXPECT_EQ(third.err, 1);
-  ASSERT_EQ(thirdRun.survey.points.size(), 1u);
-  const ComputedPoint& point = thirdRun.survey.points[0];
-  EXPECT_EQ(point.name, "CP5");
-  EXPECT_EQ(NorthingText(point.x), Trim(peg[1]));
-  EXPECT_EQ(EastingText(point.y), Trim(peg[2]));
-  EXPECT_EQ(HeightText(point.z), "11.000");
-  EXPECT_EQ(peg[3], "12.450    ");
+  ASSERT_EQ(tinh_Click(st, host).outcome, RunOutcome::Completed);
+  EXPECT_EQ(st.err, 1);  // the 13-character point name
+  EXPECT_TRUE(st.unwritable.empty());
+  for (const char* extension : {".sdo", ".cp", ".dxf"}) {
+    EXPECT_EQ(FileBytes(folder / (std::string("JOB") + extension)),
+              Expected(std::string("run/job") + extension))
+        << extension;
+  }
 }
 
 }  // namespace
