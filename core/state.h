@@ -60,8 +60,6 @@ struct FileSelection {
   std::array<std::string, 7> nhap{};
 };
 
-// A known point: name, X, Y, H as texts.
-using KnownPoint = std::array<std::string, 4>;
 
 struct ComputationFields {
   std::int32_t err = 0;  // data errors written to the error report

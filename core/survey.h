@@ -10,6 +10,7 @@
 // field book's bytes as read followed by the texts the run made.
 #pragma once
 
+#include <array>
 #include <cstddef>
 #include <cstdint>
 #include <optional>
@@ -18,6 +19,10 @@
 #include <vector>
 
 namespace kavu {
+
+// A known point as its texts stand in the field book or the control file:
+// name, X, Y, H (empty without a height, or with heights off).
+using KnownPoint = std::array<std::string, 4>;
 
 // A point with coordinates: a control point, a station or a check point.
 struct SurveyPoint {
@@ -102,9 +107,14 @@ struct ReportEntry {
 };
 
 struct Survey {
-  std::string book;                            // the field book's bytes as the run read them
-  std::string made;                            // the texts the run made, placed after the book's
-  std::vector<SurveyPoint> control;            // the known points the run used, in first-use order
+  std::string book;                  // the field book's bytes as the run read them
+  std::string made;                  // the texts the run made, placed after the book's
+  std::vector<SurveyPoint> control;  // the known points the run used, in first-use order
+  // Every known point of the run as its texts stand: the ones it read, then
+  // the pegs it set out (known points for the rest of the run, their texts
+  // as the products write them).
+  std::vector<KnownPoint> known;
+  std::size_t knownRead = 0;                   // how many of `known` the run read
   std::vector<StationResult> stations;         // in field-book order
   std::vector<ComputedPoint> points;           // detail points and pegs, in field-book order
   std::vector<ReportEntry> report;             // error-report messages, in run order

@@ -82,9 +82,8 @@ class EntityWriter {
 
 }  // namespace
 
-void WriteDrawing(TextOut& out, const RunState& st) {
-  // Label height on the ground: millimetres on paper times the scale.
-  double h = Val(st.Htext) * Val(st.Tyle) / 1000;
+void WriteDrawing(TextOut& out, const Survey& survey, double labelHeight) {
+  double h = labelHeight;
   if (!std::isfinite(h) || !std::isfinite(1.5 * h)) h = 0;
   const std::string controlHeight = ReportNumber(1.5 * h);
   const std::string detailHeight = ReportNumber(h);
@@ -93,17 +92,17 @@ void WriteDrawing(TextOut& out, const RunState& st) {
   dxf.Pair(" 0", "SECTION");
   dxf.Pair("  2", "ENTITIES");
 
-  for (const KnownPoint& point : st.MangKhongChe) {
+  for (const KnownPoint& point : survey.known) {
     dxf.Point("KC", RoundedPosition(point[1], point[2]), true);
   }
-  for (const KnownPoint& point : st.MangKhongChe) {
+  for (const KnownPoint& point : survey.known) {
     const Position p = RoundedPosition(point[1], point[2]);
     dxf.Label(p, h / 2, controlHeight, TrimView(point[0]), true);
   }
-  for (const ComputedPoint& point : st.survey.points) {
+  for (const ComputedPoint& point : survey.points) {
     if (point.kind() != PointKind::Detail) continue;
     const Position p = RoundedPosition(point);
-    dxf.Label(p, h / 2, detailHeight, st.survey.Name(point), false);
+    dxf.Label(p, h / 2, detailHeight, survey.Name(point), false);
     dxf.Point("DIEM", p, false);
   }
 

@@ -23,16 +23,13 @@ bool ReadingTooLong(std::string_view reading) { return TrimView(reading).size() 
 
 }  // namespace
 
-void WritePegFileHead(RunState& st) {
-  if (!Ticked(st.fcp)) return;
-  for (const KnownPoint& point : st.MangKhongChe) {
-    st.TenKC = point[0];
-    st.StX = point[1];
-    st.StY = point[2];
-    st.StZ = point[3];
-    std::string line = "TR " + st.TenKC.str() + " " + st.StX.str() + " " + st.StY.str();
-    if (Ticked(st.fdc)) line += " " + st.StZ.str();
-    st.cpFile.Line(line);
+void WritePegFileHead(TextOut& out, const Survey& survey, bool heights) {
+  for (std::size_t i = 0; i < survey.knownRead; ++i) {
+    const KnownPoint& point = survey.known[i];
+    std::string line = "TR " + FixedWidth(point[0], 12) + " " + NumberWidth(point[1], 11) + " " +
+                       NumberWidth(point[2], 10);
+    if (heights) line += " " + NumberWidth(point[3], 10);
+    out.Line(line);
   }
 }
 

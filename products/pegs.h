@@ -6,8 +6,9 @@
 
 namespace kavu {
 
-// The control-point lines at the head of the file, when fcp is ticked.
-void WritePegFileHead(RunState& st);
+// The control-point lines at the head of the file: the known points the run
+// read, with their heights when heights are on.
+void WritePegFileHead(TextOut& out, const Survey& survey, bool heights);
 
 // Reports the first peg of the station just computed (its points from
 // firstPoint on) whose reading cannot be a DDDMMSS reading: it ends the

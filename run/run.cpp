@@ -384,7 +384,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     AbandonKeptFiles(st);
     return Finish(st, RunOutcome::StoppedEarly);
   }
-  WritePegFileHead(st);
+  st.survey.knownRead = st.MangKhongChe.size();
   st.survey.controlListing.clear();
   st.listedNames.clear();
   // The working copy holds no station record the loop could reach (control
@@ -424,6 +424,8 @@ RunResult tinh_Click(RunState& st, Host& host) {
     return Finish(st, RunOutcome::Cancelled);
   }
 
+  // The lookups are done: the known points go to the result.
+  st.survey.known = std::move(st.MangKhongChe);
   // A run without errors leaves no error report and no station listing.
   // The products' weights: their time a point as measured (sketch rows and
   // drawing entities take the longest).
@@ -463,11 +465,16 @@ RunResult tinh_Click(RunState& st, Host& host) {
                    [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
   }
   if (Ticked(st.fdxf)) {
-    products.push_back(NewProduct(st, st.daufile + ".dxf", 4 * details,
-                                  [&](TextOut& out) { WriteDrawing(out, st); }));
+    // Millimetres on paper times the scale: the label height on the ground.
+    const double labelHeight = Val(st.Htext) * Val(st.Tyle) / 1000;
+    products.push_back(
+        NewProduct(st, st.daufile + ".dxf", 4 * details,
+                   [&, labelHeight](TextOut& out) { WriteDrawing(out, survey, labelHeight); }));
   }
   products.push_back(KeptProduct(st.cpFile, survey.stations.size(), [&](TextOut& out) {
-    if (Ticked(st.fcp)) WritePegBlocks(out, survey);
+    if (!Ticked(st.fcp)) return;
+    WritePegFileHead(out, survey, Ticked(st.fdc));
+    WritePegBlocks(out, survey);
   }));
   products.push_back(KeptProduct(st.sdoFile, 6 * details, [&](TextOut& out) {
     if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);

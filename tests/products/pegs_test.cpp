@@ -51,7 +51,8 @@ RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
   RunState st;
   st.fcp = fcp;
   st.fdc = fdc;
-  st.MangKhongChe = kControl;
+  st.survey.known = kControl;
+  st.survey.knownRead = kControl.size();
   st.cpFile.open(folder / "JOB1.cp");
   return st;
 }
@@ -67,9 +68,7 @@ TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
   RunState st = PegState(folder, 1, 1);
 
-  WritePegFileHead(st);
-  EXPECT_EQ(st.TenKC.str(), "\xa7\xd3i1        ");
-  EXPECT_EQ(st.StZ.str(), "-1.25     ");
+  WritePegFileHead(st.cpFile, st.survey, true);
   Station(st, "ST1", "DH1", "",
           {Peg("M5", "1234530", "45.6", "900000", "1.5", ""),
            Peg("CP1234567890123", "0", "1234.567", "0895959.5", "1.45", "COCGO")});
