@@ -216,6 +216,15 @@ void ReportLongName(RunState& st, std::string_view name) {
   }
 }
 
+BodyRecord BodyRecordOf(std::span<const std::string_view> fields) {
+  if (fields.size() < 5) return BodyRecord::TooFew;
+  if (fields.size() > 7) return BodyRecord::TooMany;
+  if (fields.size() == 7 && Upper(fields[6]) == "KT") return BodyRecord::Check;
+  if (fields.size() == 5) return BodyRecord::Detail;
+  const std::string_view code = TrimView(fields[5]);
+  return code.size() > 2 && KTraCCG(code) == 1 ? BodyRecord::Peg : BodyRecord::Detail;
+}
+
 void STP5(RunState& st) {
   ReportLongName(st, st.Field(0));
   const auto observation = UsableObservation(st);

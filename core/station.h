@@ -1,6 +1,9 @@
 // The surveying mathematics of a station and the routines of its records.
 #pragma once
 
+#include <span>
+#include <string_view>
+
 #include "core/numbers.h"
 #include "core/state.h"
 
@@ -35,6 +38,14 @@ void TinhToaDo(RunState& st);
 // A name longer than its 12-character field is reported (in full) before the
 // field cuts it.
 void ReportLongName(RunState& st, std::string_view name);
+
+// What a record of a station's body is, from its fields: a check sight
+// (7 fields, the last "KT"), a peg or an orientation distance (6 or 7 fields,
+// the sixth a name of 3 characters or more that is not a number), a detail
+// point (5 fields, or 6 or 7 otherwise), too few fields to be any (two
+// records run together, or the next station's), or more than 7.
+enum class BodyRecord { Detail, Peg, Check, TooFew, TooMany };
+BodyRecord BodyRecordOf(std::span<const std::string_view> fields);
 
 void STP5(RunState& st);  // detail record
 void STP6(RunState& st);  // peg or orientation distance record

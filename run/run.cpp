@@ -91,30 +91,23 @@ class WorkingCopy {
 };
 
 void HandleBodyRecord(RunState& st) {
-  const std::size_t stp = st.MangTruong.size();
-  auto codeIsPegName = [&] {
-    const std::string_view code = TrimView(st.MangTruong[5]);
-    return code.size() > 2 && KTraCCG(code) == 1;
-  };
-  if (stp == 7) {
-    if (Upper(st.MangTruong[6]) == "KT") {
+  const BodyRecord kind = BodyRecordOf(st.MangTruong);
+  switch (kind) {
+    case BodyRecord::Detail:
+      STP5(st);
+      break;
+    case BodyRecord::Peg:
+      STP6(st);
+      break;
+    case BodyRecord::Check:
       STP7(st);
-    } else if (codeIsPegName()) {
-      STP6(st);
-    } else {
-      STP5(st);
-    }
-  } else if (stp == 6) {
-    if (codeIsPegName()) {
-      STP6(st);
-    } else {
-      STP5(st);
-    }
-  } else if (stp == 5) {
-    STP5(st);
+      break;
+    case BodyRecord::TooFew:
+    case BodyRecord::TooMany:
+      break;
   }
   const std::string_view name = TrimView(st.TenDiem.str());
-  if (stp < 5 && name != "TR" && name != "DKD") {
+  if (kind == BodyRecord::TooFew && name != "TR" && name != "DKD") {
     ReportPoint(st, st.Field(0).substr(0, decltype(st.TenDiem)::kWidth), msg::kRunTogether);
   }
 }

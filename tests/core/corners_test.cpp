@@ -229,5 +229,25 @@ TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
             "3     3593000 1233.953   893000 000001.500 \r\n");
 }
 
+// What a body record is decided by its field count, "KT" in any case, and a
+// sixth field that names a peg: 3 characters or more, not all digits and
+// points.
+TEST(Corners, KindOfABodyRecord) {
+  const std::vector<std::pair<std::vector<std::string_view>, BodyRecord>> cases = {
+      {{"1", "0", "10", "900000"}, BodyRecord::TooFew},
+      {{"1", "0", "10", "900000", "1.5"}, BodyRecord::Detail},
+      {{"1", "0", "10", "900000", "1.5", "CP1"}, BodyRecord::Peg},
+      {{"1", "0", "10", "900000", "1.5", "CP"}, BodyRecord::Detail},
+      {{"1", "0", "10", "900000", "1.5", "12.5"}, BodyRecord::Detail},
+      {{"1", "0", "10", "900000", "1.5", "K2", "kt"}, BodyRecord::Check},
+      {{"1", "0", "10", "900000", "1.5", "MOC", "N"}, BodyRecord::Peg},
+      {{"1", "0", "10", "900000", "1.5", "123", "KTX"}, BodyRecord::Detail},
+      {{"1", "0", "10", "900000", "1.5", "K2", "KT", "x"}, BodyRecord::TooMany},
+  };
+  for (const auto& [fields, kind] : cases) {
+    EXPECT_EQ(BodyRecordOf(fields), kind) << fields.size() << " " << fields.back();
+  }
+}
+
 }  // namespace
 }  // namespace kavu
