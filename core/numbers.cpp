@@ -122,6 +122,7 @@ double PowerOfTen(int n) {
   return p;
 }
 
+constexpr double kTwoTo52 = 4503599627370496.0;
 constexpr double kTwoTo53 = 9007199254740992.0;
 
 // The common number of the field book, signed digits with at most one point
@@ -181,19 +182,18 @@ bool ReadNumber(std::string_view text, double& value) {
 }
 
 double RoundEvenWhole(double x) {
-  if (!std::isfinite(x)) return x;
-  const double f = std::floor(x);
-  const double diff = x - f;
-  if (diff > 0.5) return f + 1;
-  if (diff < 0.5) return f;
-  // Half way: the even one of f and f + 1 (f / 2 is exact).
-  return std::floor(f / 2) * 2 == f ? f : f + 1;
+  // From 2^52 on every double is whole (and NaN and the infinities stay).
+  if (!(std::fabs(x) < kTwoTo52) || x == 0) return x;
+  // Below it, adding 2^52 leaves no fraction: the sum is rounded to a whole
+  // number the way the processor rounds, to the nearest, ties to the even
+  // one; taking 2^52 away again is exact.
+  return x > 0 ? (x + kTwoTo52) - kTwoTo52 : (x - kTwoTo52) + kTwoTo52;
 }
 
 double RoundEven(double x, int n) {
   const double p = PowerOfTen(n);
   const double y = n >= 0 ? x * p : x / p;
-  if (!(std::fabs(y) < 4503599627370496.0)) return x;  // 2^52: nothing left to round
+  if (!(std::fabs(y) < kTwoTo52)) return x;  // nothing left to round
   const double r = RoundEvenWhole(y);
   return n >= 0 ? r / p : r * p;
 }
