@@ -34,7 +34,6 @@ shift $((OPTIND - 1))
 filter="${1:-}"
 work=$top/build/mutate
 src=$work/src
-list=$top/tools/mutations.txt
 
 sync_sources() {
   mkdir -p "$src"
@@ -97,7 +96,9 @@ while IFS= read -r line; do
   [[ "$file" == ui/* ]] && ui=ON
   build=$work/build-ui-$ui
   configure "$build" "$ui"
-  cp "$top/$file" "$src/$file"
+  # The copy taken at the start, not the working tree, which may change while
+  # the faults run.
+  cp "$src/$file" "$work/unfaulted"
   targets=(--target kavu_tests kavu-cli)
   [[ $ui == ON ]] && targets=()
   verdict=""
@@ -122,14 +123,14 @@ while IFS= read -r line; do
   else
     verdict="killed"
   fi
-  cp "$top/$file" "$src/$file"
+  cp "$work/unfaulted" "$src/$file"  # a fresh time, so that ninja rebuilds it
   case $verdict in
     killed) killed=$((killed + 1)) ;;
     survived) survived=$((survived + 1)); survivors+=("$n $file: $old ==> $new") ;;
     *) na=$((na + 1)) ;;
   esac
   printf '%3d %-9s %s: %s\n' "$n" "${verdict%% *}" "$file" "$old" | tee -a "$work/results.txt"
-done <"$list"
+done <"$src/tools/mutations.txt"  # the list as it stood at the start
 
 total=$((killed + survived))
 echo "killed $killed / $total, survived $survived, not applicable $na" | tee -a "$work/results.txt"
