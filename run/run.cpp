@@ -1,6 +1,7 @@
 #include "run/run.h"
 
 #include <algorithm>
+#include <array>
 #include <ctime>
 #include <filesystem>
 #include <functional>
@@ -301,9 +302,10 @@ Product NewProduct(const RunState& st, const std::string& path, std::size_t weig
   return product;
 }
 
-// Writes every product, shared out by weight between this thread and
-// another (the heaviest first, each to the one with less to write); each
-// writes only its own files, reading the run's result.
+// Writes every product, shared out by weight among this thread and two
+// others (while one waits for the disk, two keep both cores busy): the
+// heaviest first, each to the writer with the least to write. Each writes
+// only its own files, reading the run's result.
 void WriteProducts(std::vector<Product>& products) {
   std::vector<Product*> order;
   for (Product& product : products) {
@@ -311,11 +313,14 @@ void WriteProducts(std::vector<Product>& products) {
   }
   std::stable_sort(order.begin(), order.end(),
                    [](const Product* a, const Product* b) { return a->weight > b->weight; });
-  std::vector<Product*> here, there;
-  std::size_t hereWeight = 0, thereWeight = 0;
+  constexpr std::size_t kWriters = 3;
+  std::array<std::vector<Product*>, kWriters> shares;
+  std::array<std::size_t, kWriters> load{};
   for (Product* product : order) {
-    (hereWeight <= thereWeight ? here : there).push_back(product);
-    (hereWeight <= thereWeight ? hereWeight : thereWeight) += product->weight + 1;
+    const auto least =
+        static_cast<std::size_t>(std::min_element(load.begin(), load.end()) - load.begin());
+    shares[least].push_back(product);
+    load[least] += product->weight + 1;
   }
   const auto write = [](const std::vector<Product*>& share) {
     for (Product* product : share) {
@@ -324,8 +329,9 @@ void WriteProducts(std::vector<Product>& products) {
       file.finish();
     }
   };
-  std::jthread other(write, std::cref(there));
-  write(here);
+  std::jthread second(write, std::cref(shares[1]));
+  std::jthread third(write, std::cref(shares[2]));
+  write(shares[0]);
 }
 
 RunResult Finish(RunState& st, RunOutcome outcome) {
@@ -419,24 +425,24 @@ RunResult tinh_Click(RunState& st, Host& host) {
 
   // The lookups are done: the known points go to the result.
   st.survey.known = std::move(st.MangKhongChe);
-  // A run without errors leaves no error report and no station listing.
-  // The products' weights: their time a point as measured (sketch rows and
-  // drawing entities take the longest).
+  // The products' weights: about their time in nanoseconds, as measured, for
+  // each item they write (sketch rows and drawing entities take the longest).
   const Survey& survey = st.survey;
   const std::size_t details = survey.points.size();
   std::vector<Product> products;
+  // A run without errors leaves no error report and no station listing.
   if (st.err == 0) {
     st.errFile.abandon();
     st.cpvFile.abandon();
     for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
-    products.push_back(KeptProduct(st.cpvFile, survey.stations.size(),
+    products.push_back(KeptProduct(st.cpvFile, 1300 * survey.stations.size(),
                                    [&](TextOut& out) { WriteStationListing(out, survey); }));
-    products.push_back(KeptProduct(st.errFile, survey.report.size(),
+    products.push_back(KeptProduct(st.errFile, 40 * survey.report.size(),
                                    [&](TextOut& out) { WriteErrorReport(out, survey); }));
   }
   if (Ticked(st.fkc)) {
-    products.push_back(NewProduct(st, st.daufile + ".kc", survey.controlListing.size(),
+    products.push_back(NewProduct(st, st.daufile + ".kc", 350 * survey.controlListing.size(),
                                   [&](TextOut& out) { WriteControlListing(out, survey); }));
   }
   if (Ticked(st.fasc)) {
@@ -444,7 +450,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
     std::filesystem::create_directories(PathFromUtf8(st.tentmbd), ignored);
     for (const bool coordinates : {false, true}) {
       products.push_back(NewProduct(st, coordinates ? st.daufile + ".td1" : st.filesl1,
-                                    (coordinates ? 2 : 1) * details,
+                                    (coordinates ? 160 : 70) * details,
                                     [&, coordinates](TextOut& out) {
                                       WriteControlListing(out, survey);
                                       WriteStationRecords(out, survey, coordinates);
@@ -454,24 +460,26 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (Ticked(st.ftd)) {
     const int decimals = HeightDecimals(st.txtSoleDC);
     products.push_back(
-        NewProduct(st, st.daufile + ".txt", 2 * details,
+        NewProduct(st, st.daufile + ".txt", 160 * details,
                    [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
   }
   if (Ticked(st.fdxf)) {
     // Millimetres on paper times the scale: the label height on the ground.
     const double labelHeight = Val(st.Htext) * Val(st.Tyle) / 1000;
     products.push_back(
-        NewProduct(st, st.daufile + ".dxf", 4 * details,
+        NewProduct(st, st.daufile + ".dxf", 350 * details,
                    [&, labelHeight](TextOut& out) { WriteDrawing(out, survey, labelHeight); }));
   }
-  products.push_back(KeptProduct(st.cpFile, survey.stations.size(), [&](TextOut& out) {
-    if (!Ticked(st.fcp)) return;
-    WritePegFileHead(out, survey, Ticked(st.fdc));
-    WritePegBlocks(out, survey);
-  }));
-  products.push_back(KeptProduct(st.sdoFile, 6 * details, [&](TextOut& out) {
-    if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
-  }));
+  products.push_back(
+      KeptProduct(st.cpFile, Ticked(st.fcp) ? 1100 * survey.stations.size() : 0, [&](TextOut& out) {
+        if (!Ticked(st.fcp)) return;
+        WritePegFileHead(out, survey, Ticked(st.fdc));
+        WritePegBlocks(out, survey);
+      }));
+  products.push_back(
+      KeptProduct(st.sdoFile, Ticked(st.fsdo) ? 350 * details : 0, [&](TextOut& out) {
+        if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
+      }));
   WriteProducts(products);
   for (Product& product : products) {
     if (product.refused) {
