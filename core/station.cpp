@@ -216,6 +216,21 @@ void ReportLongName(RunState& st, std::string_view name) {
   }
 }
 
+bool ReadingTooLong(std::string_view reading) { return TrimView(reading).size() > 7; }
+
+void CheckPegReadings(RunState& st, std::size_t firstPoint) {
+  if (!Ticked(st.fcp)) return;
+  for (std::size_t i = firstPoint; i < st.survey.points.size(); ++i) {
+    const ComputedPoint& point = st.survey.points[i];
+    if (point.kind() != PointKind::Peg) continue;
+    const std::string_view record = st.survey.Record(point);
+    if (ReadingTooLong(RecordField(record, 1))) {
+      ReportPoint(st, RecordField(record, 5).substr(0, 12), msg::kWrongDegrees);
+      return;
+    }
+  }
+}
+
 BodyRecord BodyRecordOf(std::span<const std::string_view> fields) {
   if (fields.size() < 5) return BodyRecord::TooFew;
   if (fields.size() > 7) return BodyRecord::TooMany;

@@ -47,6 +47,13 @@ void ReportLongName(RunState& st, std::string_view name);
 enum class BodyRecord { Detail, Peg, Check, TooFew, TooMany };
 BodyRecord BodyRecordOf(std::span<const std::string_view> fields);
 
+// A packed angle of more than 7 characters cannot be a DDDMMSS reading.
+bool ReadingTooLong(std::string_view reading);
+// Reports the first peg of the station just computed (its points from
+// firstPoint on) whose reading cannot be a DDDMMSS reading: it ends the
+// station's block in the peg file. Only when the peg file is ticked.
+void CheckPegReadings(RunState& st, std::size_t firstPoint);
+
 void STP5(RunState& st);  // detail record
 void STP6(RunState& st);  // peg or orientation distance record
 void STP7(RunState& st);  // check record

@@ -5,21 +5,17 @@
 #include <string_view>
 #include <vector>
 
-#include "core/messages.h"
+#include "core/station.h"
 #include "core/text.h"
 
 namespace kavu {
 
 namespace {
 
-// A packed angle of more than 7 characters cannot be a DDDMMSS reading.
-constexpr std::size_t kLongestReading = 7;
 // The observation columns of a peg line are 8 characters wide; a value never
 // runs into the one before it, so the line can still be read back as a field
 // book.
 constexpr int kColumn = 8;
-
-bool ReadingTooLong(std::string_view reading) { return TrimView(reading).size() > kLongestReading; }
 
 }  // namespace
 
@@ -30,19 +26,6 @@ void WritePegFileHead(TextOut& out, const Survey& survey, bool heights) {
                        NumberWidth(point[2], 10);
     if (heights) line += " " + NumberWidth(point[3], 10);
     out.Line(line);
-  }
-}
-
-void CheckPegReadings(RunState& st, std::size_t firstPoint) {
-  if (!Ticked(st.fcp)) return;
-  for (std::size_t i = firstPoint; i < st.survey.points.size(); ++i) {
-    const ComputedPoint& point = st.survey.points[i];
-    if (point.kind() != PointKind::Peg) continue;
-    const std::string_view record = st.survey.Record(point);
-    if (ReadingTooLong(RecordField(record, 1))) {
-      ReportPoint(st, RecordField(record, 5).substr(0, 12), msg::kWrongDegrees);
-      return;
-    }
   }
 }
 

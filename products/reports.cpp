@@ -123,19 +123,6 @@ void AppendCoordinateListingLine(std::string& out, const Survey& survey, const C
   }
 }
 
-std::optional<std::string> OverInput(const RunState& st, const std::string& path) {
-  for (const std::string& input : st.inputs) {
-    if (WouldReplace(path, input)) return path + std::string(msg::kProductIsInput);
-  }
-  return std::nullopt;
-}
-
-bool ProductOverInput(RunState& st, const std::string& path) {
-  const auto refused = OverInput(st, path);
-  if (refused) st.unwritable.push_back(*refused);
-  return refused.has_value();
-}
-
 void WriteControlListing(TextOut& out, const Survey& survey) {
   for (const ControlListing& entry : survey.controlListing) {
     out.Line(ControlListingLine(survey, entry));

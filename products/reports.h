@@ -1,10 +1,10 @@
 // The run's own reports and text products.
 #pragma once
 
-#include <optional>
 #include <string>
 
-#include "core/state.h"
+#include "core/lines.h"
+#include "core/survey.h"
 
 namespace kavu {
 
@@ -19,13 +19,6 @@ void WriteStationListing(TextOut& out, const Survey& survey);
 // An orientation distance in its 8 columns, as the listing and the field
 // sketch show it.
 std::string OrientationDistanceText(double distance);
-
-// The refusal to write the product at path when it would replace a file the
-// run reads (the path and the words saying so), or nothing.
-std::optional<std::string> OverInput(const RunState& st, const std::string& path);
-// The same, the refusal named in st.unwritable; true when the product must be
-// passed over.
-bool ProductOverInput(RunState& st, const std::string& path);
 
 // The products after the station loop: the control-point listing (.kc, and
 // the head of the TRIDO book and the .td1), ended by an empty line; the

@@ -40,6 +40,23 @@ std::string TimeOfDay() {
   return std::string(text, length);
 }
 
+// The refusal to write the product at path when it would replace a file the
+// run reads (the path and the words saying so), or nothing.
+std::optional<std::string> OverInput(const RunState& st, const std::string& path) {
+  for (const std::string& input : st.inputs) {
+    if (WouldReplace(path, input)) return path + std::string(msg::kProductIsInput);
+  }
+  return std::nullopt;
+}
+
+// The same, the refusal named in st.unwritable; true when the product must be
+// passed over.
+bool ProductOverInput(RunState& st, const std::string& path) {
+  const auto refused = OverInput(st, path);
+  if (refused) st.unwritable.push_back(*refused);
+  return refused.has_value();
+}
+
 // Distance tolerance in metres for the map scale 1:T.
 double DistanceTolerance(double scale) {
   if (scale <= 500) return 0.02;
