@@ -131,8 +131,6 @@ constexpr double kTwoTo53 = 9007199254740992.0;
 // power of ten, both exact, so the one rounding of the division gives the
 // nearest double, as the full conversion does. False for any other text.
 bool ScanPlainNumber(std::string_view text, Scan& scan) {
-  static constexpr double kPowers[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
-                                       1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
   std::size_t i = 0;
   const bool negative = !text.empty() && text[0] == '-';
   if (!text.empty() && (text[0] == '-' || text[0] == '+')) ++i;
@@ -157,7 +155,7 @@ bool ScanPlainNumber(std::string_view text, Scan& scan) {
     if (IsBlank(c) || c == 'E' || c == 'e' || c == 'D' || c == 'd') return false;
   }
   double value = static_cast<double>(whole);
-  if (decimals > 0) value /= kPowers[decimals];
+  if (decimals > 0) value /= PowerOfTen(decimals);
   scan.value = negative ? -value : value;
   scan.has_digit = true;
   return true;

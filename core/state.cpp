@@ -50,10 +50,8 @@ void ReportPoint(RunState& st, std::string_view name, std::string_view message) 
   const auto* const found =
       std::find(std::begin(msg::kPointMessages), std::end(msg::kPointMessages), message);
   if (shown.empty() || shown.front() == ' ' || found == std::end(msg::kPointMessages)) {
-    std::string text(msg::kPoint);
-    text.append(name);
-    if (name.size() < 12) text.append(12 - name.size(), ' ');
-    text.append(message);
+    std::string text;
+    AppendPointLine(text, name, message);
     st.survey.AddReport(text, name, st.line);
     return;
   }

@@ -44,18 +44,8 @@ std::uint64_t Survey::Keep(std::string_view text) {
 
 Survey::PointTexts Survey::Texts(const ComputedPoint& point) const {
   // The record's first fields, in one pass up to its line end.
-  const std::string_view rest = Text(point.record, std::string_view::npos);
   std::array<std::string_view, 7> f;
-  std::size_t count = 0;
-  std::size_t start = 0;
-  std::size_t end = 0;
-  for (; end < rest.size() && rest[end] != '\r' && rest[end] != '\n'; ++end) {
-    if (rest[end] != ' ') continue;
-    if (count < f.size()) f[count] = rest.substr(start, end - start);
-    ++count;
-    start = end + 1;
-  }
-  if (end > 0 && count < f.size()) f[count] = rest.substr(start, end - start);
+  RecordFields(Text(point.record, std::string_view::npos), f);
   const bool peg = point.kind() == PointKind::Peg;
   return {(peg ? f[5] : f[0]).substr(0, kNameWidth), point.words ? f[5] : std::string_view(),
           point.words || peg ? f[6] : std::string_view(), f[4]};
@@ -71,10 +61,14 @@ void Survey::AppendText(std::string& out, const ReportEntry& entry) const {
     out.append(Text(entry.at + entry.size, size));
     return;
   }
+  AppendPointLine(out, name, msg::kPointMessages[entry.message - 1]);
+}
+
+void AppendPointLine(std::string& out, std::string_view name, std::string_view message) {
   out.append(msg::kPoint);
   out.append(name);
   if (name.size() < kNameWidth) out.append(kNameWidth - name.size(), ' ');
-  out.append(msg::kPointMessages[entry.message - 1]);
+  out.append(message);
 }
 
 std::string Survey::TextOf(const ReportEntry& entry) const {

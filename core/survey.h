@@ -106,6 +106,10 @@ struct ReportEntry {
   std::uint32_t line = 0;  // field-book line of the record it concerns, 0 when none
 };
 
+// A report line about a point: "Diem " + its name in 12 columns (a longer
+// name whole) + the message, appended to out.
+void AppendPointLine(std::string& out, std::string_view name, std::string_view message);
+
 struct Survey {
   std::string book;                  // the field book's bytes as the run read them
   std::string made;                  // the texts the run made, placed after the book's

@@ -80,21 +80,22 @@ void SplitFields(std::string& line, std::vector<std::string_view>& fields);
 // Field k (from 0) of a line whose fields are set off by single spaces, or the
 // empty text past its last field.
 std::string_view RecordField(std::string_view record, std::size_t k);
-// The first fields of such a line, the empty text past its last; the number
-// of its fields.
+// The first fields of such a line, up to its line end (CR or LF) if it has
+// one, the empty text past its last; the number of its fields.
 template <std::size_t N>
 std::size_t RecordFields(std::string_view record, std::array<std::string_view, N>& fields) {
   fields = {};
   std::size_t count = 0;
-  if (record.empty()) return 0;
   std::size_t start = 0;
-  for (std::size_t i = 0; i < record.size(); ++i) {
-    if (record[i] != ' ') continue;
-    if (count < N) fields[count] = record.substr(start, i - start);
+  std::size_t end = 0;
+  for (; end < record.size() && record[end] != '\r' && record[end] != '\n'; ++end) {
+    if (record[end] != ' ') continue;
+    if (count < N) fields[count] = record.substr(start, end - start);
     ++count;
-    start = i + 1;
+    start = end + 1;
   }
-  if (count < N) fields[count] = record.substr(start);
+  if (end == 0) return 0;
+  if (count < N) fields[count] = record.substr(start, end - start);
   return count + 1;
 }
 
