@@ -18,6 +18,7 @@
 #include "core/messages.h"
 #include "core/state.h"
 #include "core/tcvn3.h"
+#include "core/typed_numbers.h"
 #include "run/run.h"
 #ifdef KAVU_CLI_PICTURES
 #include "cli/pictures.h"
@@ -143,18 +144,6 @@ std::optional<std::uint64_t> ParseSeed(std::string_view text) {
   return value;
 }
 
-// A number typed in full: the whole text is a finite decimal number.
-std::optional<double> ParseNumber(std::string_view text) {
-  if (text.starts_with('+')) text.remove_prefix(1);
-  double value = 0;
-  const auto [end, ec] = std::from_chars(text.data(), text.data() + text.size(), value);
-  if (ec != std::errc{} || end != text.data() + text.size() || text.empty() ||
-      !std::isfinite(value)) {
-    return std::nullopt;
-  }
-  return value;
-}
-
 // The command line's settings, before they are turned into window fields.
 struct Settings {
   std::string file;
@@ -204,10 +193,10 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
                  "6 Topcom 226 .tcm, 7 GRE, 8 DN7, 9 other")
       ->type_name("auto|0..9");
   app.add_option("--scale", set.scale,
-                 "map scale denominator: sets the distance tolerance (default: 1000)")
+                 "map scale: 500, 1:500 or 1/500; sets the distance tolerance\n(default: 1000)")
       ->type_name("NUMBER");
   app.add_option("--text-height", set.textHeight,
-                 "label height in mm in the drawing file (default: 2.0)")
+                 "label height in mm in the drawing file, 2.5 or 2,5 (default: 2.0)")
       ->type_name("NUMBER");
   app.add_option("--height-decimals", set.heightDecimals,
                  "decimals of the heights in the coordinate text file (default: 2)")
@@ -258,13 +247,19 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
 
   const std::optional<int> kind = ParseKind(set.kind);
   if (!kind) return Usage(err, "--kind: expected auto or a number from 0 to 9, got: " + set.kind);
-  const std::optional<double> scale = ParseNumber(set.scale);
-  if (!scale || *scale <= 0)
-    return Usage(err, "--scale: expected a positive number, got: " + set.scale);
-  for (const auto& [option, text] : {std::pair{"--text-height", &set.textHeight},
-                                     std::pair{"--height-decimals", &set.heightDecimals}}) {
-    if (!ParseNumber(*text))
-      return Usage(err, std::string(option) + ": expected a number, got: " + *text);
+  // The window reads the same texts with the same reader.
+  const TypedRunNumbersRead typed = ReadRunNumbers(set.scale, set.textHeight, set.heightDecimals);
+  if (!typed.numbers) {
+    switch (typed.refused) {
+      case TypedBox::Scale:
+        return Usage(err, "--scale: expected a map scale above 0 such as 500, 1:500 or 1/500, got: " +
+                              set.scale);
+      case TypedBox::TextHeight:
+        return Usage(err, "--text-height: expected a number above 0 (2.5 or 2,5), got: " +
+                              set.textHeight);
+      case TypedBox::HeightDecimals:
+        return Usage(err, "--height-decimals: expected a number, got: " + set.heightDecimals);
+    }
   }
   std::optional<std::uint64_t> seed;
   if (!set.seed.empty() || app.count("--seed") > 0) {

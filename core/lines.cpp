@@ -1,5 +1,6 @@
 #include "core/lines.h"
 
+#include <cerrno>
 #include <cstring>
 #include <fstream>
 #include <ios>
@@ -23,10 +24,9 @@
 #include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
-
-#include <cerrno>
 #endif
 
+#include "core/messages.h"
 #include "core/paths.h"
 
 namespace kavu {
@@ -133,6 +133,28 @@ std::filesystem::path TempPathOf(const std::filesystem::path& path) {
   return temp;
 }
 
+namespace {
+
+std::error_code LastError() { return {errno, std::generic_category()}; }
+
+}  // namespace
+
+std::string UnwritableEntry(const std::string& path, std::error_code reason) {
+  const std::error_condition condition = reason.default_error_condition();
+  std::string_view why = msg::kWriteFailed;
+  if (condition == std::errc::permission_denied || condition == std::errc::operation_not_permitted)
+    why = msg::kNoWritePermission;
+  else if (condition == std::errc::read_only_file_system)
+    why = msg::kReadOnlyDisk;
+  else if (condition == std::errc::no_space_on_device || condition == std::errc::file_too_large)
+    why = msg::kDiskFull;
+  else if (condition == std::errc::no_such_file_or_directory || condition == std::errc::not_a_directory)
+    why = msg::kNoSuchFolder;
+  else if (condition == std::errc::is_a_directory)
+    why = msg::kIsAFolder;
+  return path + " (" + std::string(why) + ")";
+}
+
 TextOut::TextOut(const std::filesystem::path& path) { open(path); }
 
 TextOut::TextOut(const std::string& utf8Path) { open(PathFromUtf8(utf8Path)); }
@@ -144,7 +166,8 @@ TextOut::TextOut(TextOut&& other) noexcept
       buffer_(std::move(other.buffer_)),
       path_(std::move(other.path_)),
       failed_(other.failed_),
-      finished_(std::exchange(other.finished_, false)) {}
+      finished_(std::exchange(other.finished_, false)),
+      error_(other.error_) {}
 
 TextOut& TextOut::operator=(TextOut&& other) noexcept {
   if (this != &other) {
@@ -154,6 +177,7 @@ TextOut& TextOut::operator=(TextOut&& other) noexcept {
     path_ = std::move(other.path_);
     failed_ = other.failed_;
     finished_ = std::exchange(other.finished_, false);
+    error_ = other.error_;
   }
   return *this;
 }
@@ -173,7 +197,9 @@ bool TextOut::open(const std::filesystem::path& path) {
 #else
   file_.reset(std::fopen(temp.c_str(), "wb"));
 #endif
-  failed_ = file_ == nullptr;
+  failed_ = false;
+  error_.clear();
+  if (file_ == nullptr) Fail(LastError());
   // Room for a block and the line that fills it, so that it never grows.
   buffer_.reserve(kBlock + (1 << 16));
   return !failed_;
@@ -181,10 +207,15 @@ bool TextOut::open(const std::filesystem::path& path) {
 
 bool TextOut::ok() const { return file_ != nullptr && !failed_; }
 
+void TextOut::Fail(std::error_code ec) {
+  if (!failed_ || !error_) error_ = ec ? ec : std::make_error_code(std::errc::io_error);
+  failed_ = true;
+}
+
 bool TextOut::Drain() {
   if (!buffer_.empty() && ok() &&
       std::fwrite(buffer_.data(), 1, buffer_.size(), file_.get()) != buffer_.size()) {
-    failed_ = true;
+    Fail(LastError());
   }
   buffer_.clear();
   return ok();
@@ -195,7 +226,7 @@ void TextOut::Write(std::string_view text) {
   if (text.size() >= kBlock) {
     // A large text goes straight to the file, after what is waiting.
     if (Drain() && std::fwrite(text.data(), 1, text.size(), file_.get()) != text.size()) {
-      failed_ = true;
+      Fail(LastError());
     }
     return;
   }
@@ -229,10 +260,16 @@ bool FlushToDisk(std::FILE* file) {
 
 bool TextOut::finish() {
   if (!file_) return !failed_;
-  bool written = Drain() && FlushToDisk(file_.get());
+  bool written = Drain();
+  if (written && !FlushToDisk(file_.get())) {
+    Fail(LastError());
+    written = false;
+  }
   std::string().swap(buffer_);  // the block's memory goes back at once
-  written = std::fclose(file_.release()) == 0 && written;
-  if (!written) failed_ = true;
+  if (std::fclose(file_.release()) != 0) {
+    Fail(LastError());
+    written = false;
+  }
   finished_ = true;
   return written;
 }
@@ -247,6 +284,7 @@ bool TextOut::commit() {
     // Renaming replaces a link of that name itself, not the file it names.
     std::filesystem::rename(temp, path_, ec);
     written = !ec;
+    if (ec) Fail(ec);
   }
   if (!written) {
     failed_ = true;

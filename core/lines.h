@@ -10,6 +10,7 @@
 #include <optional>
 #include <string>
 #include <string_view>
+#include <system_error>
 #include <vector>
 
 namespace kavu {
@@ -94,8 +95,12 @@ class TextOut {
   // Drops what was written; the previous file stays as it was.
   void abandon();
   const std::filesystem::path& path() const { return path_; }
+  // Why the file could not be written (the first failure), or none.
+  std::error_code error() const { return error_; }
 
  private:
+  // The first failure kept: later ones follow from it.
+  void Fail(std::error_code ec);
   struct Closer {
     void operator()(std::FILE* file) const { std::fclose(file); }
   };
@@ -107,7 +112,12 @@ class TextOut {
   std::filesystem::path path_;
   bool failed_ = false;
   bool finished_ = false;  // closed, not yet put in place
+  std::error_code error_;
 };
+
+// A product that could not be written, as the summary names it: the path and
+// the reason in a few words ("Không ghi được File: " comes before it).
+std::string UnwritableEntry(const std::string& path, std::error_code reason);
 
 // An exclusive lock on a file, held by the operating system for this process
 // (released when the process ends, however it ends). The lock file is removed

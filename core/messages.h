@@ -24,6 +24,18 @@ inline constexpr std::string_view kNoDetailData =
     "File không có số liệu điểm chi tiết. Kiểm tra lại!";
 inline constexpr std::string_view kNoControlFile = "Chưa chọn file khống chế.";
 inline constexpr std::string_view kCannotWrite = "Không ghi được File: ";
+// Why: in brackets after the file's path.
+inline constexpr std::string_view kNoWritePermission = "không có quyền ghi vào thư mục";
+inline constexpr std::string_view kReadOnlyDisk = "ổ đĩa chỉ cho đọc";
+inline constexpr std::string_view kDiskFull = "đĩa đầy";
+inline constexpr std::string_view kNoSuchFolder = "không có thư mục này";
+inline constexpr std::string_view kIsAFolder = "trùng tên một thư mục";
+inline constexpr std::string_view kWriteFailed = "lỗi ghi đĩa";
+// A typed number that cannot be read: the box's name, then this, then the text.
+inline constexpr std::string_view kScaleBox = "Tỷ lệ bản đồ";
+inline constexpr std::string_view kTextHeightBox = "Chiều cao chữ";
+inline constexpr std::string_view kHeightDecimalsBox = "Số lẻ độ cao";
+inline constexpr std::string_view kCannotReadTyped = " không đọc được: ";
 
 // The summary.
 inline constexpr std::string_view kTotalStations = "Tổng số trạm máy:     ";
@@ -32,6 +44,10 @@ inline constexpr std::string_view kTotalErrors = "Tổng số lỗi: ";
 inline constexpr std::string_view kStarted = "Bắt đầu tính: ";
 inline constexpr std::string_view kEnded = "Kết thúc tính: ";
 inline constexpr std::string_view kContinue = "Bạn có tiếp tục chương trình không ?";
+inline constexpr std::string_view kFilesWritten = "Các File đã ghi:";
+inline constexpr std::string_view kWrittenIndent = "    ";
+inline constexpr std::string_view kStopTooLate =
+    "Lệnh dừng tính đến muộn: các File đã được ghi xong.";
 
 // Error report.
 inline constexpr std::string_view kErrHeader1 = "        THONG BAO CAC LOI NHAP SO LIEU";

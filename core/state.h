@@ -99,7 +99,6 @@ struct ComputationFields {
   std::int16_t dctdau = 1;
   double pvd = 0, cdhdau = 0, dscdh = 0.05;
   double gpv = 0, cdh = 0;
-  std::string Tyle, Htext;
 
   // The current point.
   double GocD = 0, ccg = 0;
@@ -151,8 +150,10 @@ struct ComputationFields {
   // report.
   std::vector<std::string> conversionReport;
 
-  // Products that could not be written, named in the summary.
+  // Products that could not be written (with the reason), named in the
+  // summary; and those put in place.
   std::vector<std::string> unwritable;
+  std::vector<std::string> written;
   // The files the run reads (chosen file, field book, common control file):
   // no product is written over one of them.
   std::vector<std::string> inputs;

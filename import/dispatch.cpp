@@ -222,7 +222,14 @@ std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* j
     st.conversionReport = std::move(conversion.report);
     TextOut out(fieldBook);
     out.Write(*content);
-    if (!out.commit()) st.unwritable.push_back(fieldBook);
+    if (out.commit()) {
+      st.written.push_back(fieldBook);
+    } else {
+      // The run computes the conversion all the same; the window stays on
+      // the instrument file, since no field book stands beside it.
+      st.unwritable.push_back(UnwritableEntry(fieldBook, out.error()));
+      return content;
+    }
   } else {
     content = ReadFileBytes(fieldBook);
   }

@@ -156,9 +156,4 @@ void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals) {
   }
 }
 
-int HeightDecimals(const std::string& text) {
-  const double d = RoundEvenWhole(Val(text));
-  return static_cast<int>(std::clamp(d, 0.0, 10.0));
-}
-
 }  // namespace kavu

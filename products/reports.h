@@ -28,8 +28,6 @@ std::string OrientationDistanceText(double distance);
 void WriteControlListing(TextOut& out, const Survey& survey);
 void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates);
 void WriteCoordinateText(TextOut& out, const Survey& survey, int decimals);
-// The decimals of the .txt heights, as typed (0 to 10).
-int HeightDecimals(const std::string& text);
 
 // A line of the control-point listing (.kc and the head of the TRIDO book and
 // .td1), and a detail point's line of the coordinate listing (.td1), appended.

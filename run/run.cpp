@@ -18,6 +18,7 @@
 #include "core/station.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
+#include "core/typed_numbers.h"
 #include "import/dispatch.h"
 #include "products/dxf.h"
 #include "products/pegs.h"
@@ -265,9 +266,11 @@ void ReadStationHeader(RunState& st, WorkingCopy& copy) {
   }
 }
 
+// A file that cannot be opened is named at the end of the run, and only when
+// it was to be written (the error report only when there are errors).
 void OpenKeptFile(RunState& st, TextOut& file, const std::string& path) {
   if (ProductOverInput(st, path)) return;
-  if (!file.open(path)) st.unwritable.push_back(path);
+  file.open(path);
 }
 
 // A run that stops early leaves every product as it was.
@@ -293,14 +296,17 @@ struct Product {
   std::string failure;                 // its name in the summary when it cannot be written
   std::optional<std::string> refused;  // it would replace a file the run reads
   bool commit = true;                  // a kept file is put in place only when it was opened
+  bool wanted = true;                  // a kept file that the run was asked to write
   std::size_t weight = 0;              // its share of the writing
 
   TextOut& File() { return kept != nullptr ? *kept : own; }
 };
 
-Product KeptProduct(TextOut& file, std::size_t weight, std::function<void(TextOut&)> write) {
+Product KeptProduct(TextOut& file, bool wanted, std::size_t weight,
+                    std::function<void(TextOut&)> write) {
   Product product;
   product.kept = &file;
+  product.wanted = wanted;
   product.commit = file.is_open();
   product.failure = Utf8FromPath(file.path());
   product.weight = weight;
@@ -356,6 +362,7 @@ RunResult Finish(RunState& st, RunOutcome outcome) {
   result.outcome = outcome;
   result.err = st.err;
   result.unwritable = st.unwritable;
+  result.written = st.written;
   result.survey = std::move(st.survey);
   return result;
 }
@@ -377,6 +384,15 @@ RunResult tinh_Click(RunState& st, Host& host) {
   st.rng = st.seed ? SplitMix64(*st.seed) : SplitMix64::FromClock();
   const std::string startTime = TimeOfDay();
 
+  // The typed numbers are read before anything is converted or written; the
+  // hosts refuse an unreadable one before they start a run.
+  const TypedRunNumbersRead typed = ReadRunNumbers(st.TyleTXT, st.Htxt, st.txtSoleDC);
+  if (!typed.numbers) {
+    host.MessageBox(TypedRefusalMessage(typed), MsgIcon::Critical, MsgButtons::Ok);
+    return Finish(st, RunOutcome::NotStarted);
+  }
+  const TypedRunNumbers numbers = *typed.numbers;
+
   FileLock jobLock;
   auto fieldBook = CheckAndConvert(st, host, &jobLock);
   if (!fieldBook) return Finish(st, RunOutcome::NotStarted);
@@ -384,9 +400,7 @@ RunResult tinh_Click(RunState& st, Host& host) {
   st.survey.book = std::move(*fieldBook);
   fieldBook.reset();
 
-  st.Tyle = st.TyleTXT;
-  st.Htext = st.Htxt;
-  st.dscdh = DistanceTolerance(Val(st.Tyle));
+  st.dscdh = DistanceTolerance(numbers.scale);
 
   // Every product goes to a temporary file and replaces the earlier one only
   // when the run has come to its end, after all that it reads was read.
@@ -451,11 +465,10 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (st.err == 0) {
     st.errFile.abandon();
     st.cpvFile.abandon();
-    for (const char* extension : {".err", ".cpv"}) RemoveProduct(st, st.daufile + extension);
   } else {
-    products.push_back(KeptProduct(st.cpvFile, 1300 * survey.stations.size(),
+    products.push_back(KeptProduct(st.cpvFile, true, 1300 * survey.stations.size(),
                                    [&](TextOut& out) { WriteStationListing(out, survey); }));
-    products.push_back(KeptProduct(st.errFile, 40 * survey.report.size(),
+    products.push_back(KeptProduct(st.errFile, true, 40 * survey.report.size(),
                                    [&](TextOut& out) { WriteErrorReport(out, survey); }));
   }
   if (Ticked(st.fkc)) {
@@ -475,37 +488,60 @@ RunResult tinh_Click(RunState& st, Host& host) {
     }
   }
   if (Ticked(st.ftd)) {
-    const int decimals = HeightDecimals(st.txtSoleDC);
+    const int decimals = numbers.heightDecimals;
     products.push_back(
         NewProduct(st, st.daufile + ".txt", 160 * details,
                    [&, decimals](TextOut& out) { WriteCoordinateText(out, survey, decimals); }));
   }
   if (Ticked(st.fdxf)) {
     // Millimetres on paper times the scale: the label height on the ground.
-    const double labelHeight = Val(st.Htext) * Val(st.Tyle) / 1000;
+    const double labelHeight = numbers.textHeight * numbers.scale / 1000;
     products.push_back(
         NewProduct(st, st.daufile + ".dxf", 350 * details,
                    [&, labelHeight](TextOut& out) { WriteDrawing(out, survey, labelHeight); }));
   }
   products.push_back(
-      KeptProduct(st.cpFile, Ticked(st.fcp) ? 1100 * survey.stations.size() : 0, [&](TextOut& out) {
+      KeptProduct(st.cpFile, Ticked(st.fcp), Ticked(st.fcp) ? 1100 * survey.stations.size() : 0,
+                  [&](TextOut& out) {
         if (!Ticked(st.fcp)) return;
         WritePegFileHead(out, survey, Ticked(st.fdc));
         WritePegBlocks(out, survey);
       }));
   products.push_back(
-      KeptProduct(st.sdoFile, Ticked(st.fsdo) ? 350 * details : 0, [&](TextOut& out) {
+      KeptProduct(st.sdoFile, Ticked(st.fsdo), Ticked(st.fsdo) ? 350 * details : 0,
+                  [&](TextOut& out) {
         if (Ticked(st.fsdo)) WriteSketch(out, survey, st.nhap);
       }));
   WriteProducts(products);
+  // A stop asked for while the products were written still leaves every
+  // earlier product as it was.
+  if (host.Cancelled()) {
+    for (Product& product : products) product.File().abandon();
+    AbandonKeptFiles(st);
+    host.SetTitle(msg::kProgramTitle);
+    host.MessageBox(msg::kRunCancelled, MsgIcon::Information, MsgButtons::Ok);
+    return Finish(st, RunOutcome::Cancelled);
+  }
   for (Product& product : products) {
+    TextOut& file = product.File();
     if (product.refused) {
       st.unwritable.push_back(*product.refused);
-    } else if (product.commit && !product.File().commit()) {
-      st.unwritable.push_back(product.failure);
+    } else if (!product.commit) {
+      // A kept file that could not be opened (a refused one has no error).
+      if (product.wanted && file.error()) {
+        st.unwritable.push_back(UnwritableEntry(product.failure, file.error()));
+      }
+    } else if (file.commit()) {
+      st.written.push_back(product.failure);
+    } else {
+      st.unwritable.push_back(UnwritableEntry(product.failure, file.error()));
     }
   }
-  if (st.err == 0) RemoveProduct(st, st.daufile + ".bak");
+  if (st.err == 0) {
+    for (const char* extension : {".err", ".cpv", ".bak"}) {
+      RemoveProduct(st, st.daufile + extension);
+    }
+  }
 
   jobLock.Release();
 
@@ -516,13 +552,24 @@ RunResult tinh_Click(RunState& st, Host& host) {
   host.SetTitle(msg::kProgramTitle);
   result.endTime = TimeOfDay();
 
+  // A stop that came after the products were put in place is too late.
+  result.stopTooLate = host.Cancelled();
   std::string text;
   for (const std::string& line : SummaryLines(result)) text += line + "\r";
   for (const std::string& path : result.unwritable) {
     text += std::string(msg::kCannotWrite) + path + "\r";
   }
+  if (result.stopTooLate) text += std::string(msg::kStopTooLate) + "\r";
+  if (!result.written.empty()) {
+    text += "\r" + std::string(msg::kFilesWritten) + "\r";
+    for (const std::string& path : result.written) {
+      text += std::string(msg::kWrittenIndent) + Utf8FromPath(PathFromUtf8(path).filename()) + "\r";
+    }
+  }
   text += "\r" + std::string(msg::kContinue);
-  result.answer = host.MessageBox(text, MsgIcon::Information, MsgButtons::YesNo);
+  const MsgIcon icon = result.unwritable.empty() && !result.stopTooLate ? MsgIcon::Information
+                                                                        : MsgIcon::Exclamation;
+  result.answer = host.MessageBox(text, icon, MsgButtons::YesNo);
   host.Beep();
   return result;
 }

@@ -24,7 +24,9 @@ struct RunResult {
   long long bodyRecords = 0;
   std::int32_t err = 0;
   std::string startTime, endTime;       // HH:MM:SS
-  std::vector<std::string> unwritable;  // products that could not be written
+  std::vector<std::string> unwritable;  // products that could not be written, with the reason
+  std::vector<std::string> written;     // products put in place, in the order of the summary
+  bool stopTooLate = false;             // a stop asked for once the products were in place
   MsgAnswer answer = MsgAnswer::Ok;     // the answer to the closing question
   Survey survey;                        // what the run computed and reported
 };

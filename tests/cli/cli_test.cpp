@@ -60,7 +60,10 @@ TEST(CliUsage, BadCommandLinesExit64WithoutRunning) {
       {"--scale", "abc", book},                  // the settings are numbers
       {"--scale", "0", book},                    // a scale is positive
       {"--scale", "nan", book},                  //
-      {"--text-height", "2,5", book},            //
+      {"--scale", "1:5OO", book},                // a letter O among the digits
+      {"--scale", "1.000", book},                // a thousand, or one?
+      {"--text-height", "2,5,0", book},          // one separator at most
+      {"--text-height", "0", book},              // a label has a height
       {"--height-decimals", "", book},           //
 #ifndef KAVU_CLI_PICTURES
       {"--png", book + ".png", book},  // pictures need Qt

@@ -65,11 +65,16 @@ struct Row {
   std::function<void(Job&)> prepare = nullptr;  // makes the fault in the job's folder
   std::set<std::string> changed = {};           // files that may change, from the root
   std::string shell = "";                       // runs the executable after this set-up
+  std::vector<std::string> hidden = {};         // never on stderr or stdout
 };
 
 std::string S(std::string_view text) { return std::string(text); }
 std::string OverInput(const char* path) {
   return S(msg::kCannotWrite) + path + S(msg::kProductIsInput);
+}
+
+std::string Full(const char* path) {
+  return S(msg::kCannotWrite) + path + " (" + S(msg::kDiskFull) + ")\n";
 }
 
 std::vector<Row> Rows() {
@@ -109,10 +114,17 @@ std::vector<Row> Rows() {
           },
           {"data/job1.txt", "data/job1.kc", "TRIDO/job1.asc"}),
       // Files may not grow beyond 2 KB: the larger products cannot be written.
+      // The reason is named; the error report is not, since the run found no error.
       Row("disk full", all, kExitDataErrors,
-          {S(msg::kCannotWrite) + "@data/job1.txt\n", S(msg::kCannotWrite) + "@data/job1.td1\n",
-           S(msg::kCannotWrite) + "@data/job1.sdo\n", S(msg::kCannotWrite) + "@data/job1.dxf\n"},
-          nullptr, {}, "ulimit -f 4; trap '' XFSZ; "),
+          {Full("@data/job1.txt"), Full("@data/job1.td1"), Full("@data/job1.sdo"),
+           Full("@data/job1.dxf")},
+          nullptr, {}, "ulimit -f 4; trap '' XFSZ; ", {"job1.err", "job1.cpv"}),
+      Row("a folder where a product goes", all, kExitDataErrors,
+          {S(msg::kCannotWrite) + "@data/job1.txt (" + S(msg::kIsAFolder) + ")\n"},
+          [](Job& j) {
+            fs::remove(j.In("@data/job1.txt"));
+            fs::create_directory(j.In("@data/job1.txt"));
+          }),
       Row("the temporary files of a killed run", all, kExitOk, {},
           [](Job& j) {
             for (const char* name : {"@data/job1.txt.kavu-tmp", "@TRIDO/job1.asc.kavu-tmp"}) {
@@ -189,6 +201,9 @@ TEST(Faults, NoFileIsEverLost) {
     EXPECT_EQ(o.code, row.code) << o.out << o.err;
     for (const std::string& text : row.shown) {
       EXPECT_NE((o.err + o.out).find(j.In(text)), std::string::npos) << text << o.out << o.err;
+    }
+    for (const std::string& text : row.hidden) {
+      EXPECT_EQ((o.err + o.out).find(text), std::string::npos) << text << o.out << o.err;
     }
     const bool stopped = row.code == kExitStopped || row.code == kExitInterrupted;
     EXPECT_TRUE(o.out.empty() || !stopped) << o.out;

@@ -123,5 +123,69 @@ TEST(Run, SurveyHoldsWhatTheProductsShow) {
   EXPECT_EQ(pegs, (std::vector<std::string>{"CP1", "CP2"}));
 }
 
+// A stop asked for at the n-th time the run asks (from 1; 0 never).
+class StoppingHost : public RecordingHost {
+ public:
+  explicit StoppingHost(int at) : at_(at) {}
+  bool Cancelled() override { return at_ > 0 && ++asked_ >= at_; }
+  int asked() const { return asked_; }
+
+ private:
+  int at_;
+  int asked_ = 0;
+};
+
+// The stop works until the products are put in place: asked for while they
+// are written, it leaves every earlier product as it was; once they stand,
+// the summary says it came too late. The summary lists the files written.
+TEST(Run, StopWorksUntilTheProductsAreInPlace) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "data");
+  fs::copy_file(kEveryRecord / "job.asc", folder / "data" / "job.asc");
+  const fs::path txt = folder / "data" / "job.txt";
+  WriteBytes(txt, "earlier\r\n");
+
+  // How often a whole run asks, counted by a host that never stops it.
+  struct Counter : StoppingHost {
+    Counter() : StoppingHost(0) {}
+    int calls = 0;
+    bool Cancelled() override { return ++calls, false; }
+  } counter;
+  RunState st = StateFor(folder / "data" / "job.asc");
+  ASSERT_EQ(tinh_Click(st, counter).outcome, RunOutcome::Completed);
+  ASSERT_GE(counter.calls, 3);
+  EXPECT_NE(FileBytes(txt), "earlier\r\n");
+
+  for (const int stopAt : {counter.calls - 1, counter.calls}) {
+    WriteBytes(txt, "earlier\r\n");
+    fs::remove(folder / "data" / "job.err");
+    StoppingHost host(stopAt);
+    RunState again = StateFor(folder / "data" / "job.asc");
+    const RunResult result = tinh_Click(again, host);
+    ASSERT_FALSE(host.messages.empty());
+    if (stopAt == counter.calls - 1) {  // the products written, not yet in place
+      EXPECT_EQ(result.outcome, RunOutcome::Cancelled);
+      EXPECT_EQ(FileBytes(txt), "earlier\r\n");
+      EXPECT_FALSE(fs::exists(folder / "data" / "job.err"));
+      EXPECT_EQ(host.messages.back(), msg::kRunCancelled);
+    } else {
+      EXPECT_EQ(result.outcome, RunOutcome::Completed);
+      EXPECT_TRUE(result.stopTooLate);
+      EXPECT_NE(FileBytes(txt), "earlier\r\n");
+      const std::string& summary = host.messages.back();
+      EXPECT_NE(summary.find(msg::kStopTooLate), std::string::npos) << summary;
+      EXPECT_NE(summary.find(std::string(msg::kFilesWritten) + "\r"), std::string::npos);
+      for (const char* name : {"job.err", "job.cpv", "job.txt"}) {
+        EXPECT_NE(summary.find(std::string(msg::kWrittenIndent) + name + "\r"), std::string::npos)
+            << name;
+      }
+      EXPECT_EQ(result.written.size(), 3u);
+    }
+    for (const auto& entry : fs::directory_iterator(folder / "data")) {
+      EXPECT_FALSE(entry.path().string().ends_with(".kavu-tmp")) << entry.path();
+    }
+  }
+}
+
 }  // namespace
 }  // namespace kavu
