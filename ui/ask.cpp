@@ -66,14 +66,22 @@ void SetUpMessageBox(QMessageBox& box, const Question& question) {
       box.setEscapeButton(QMessageBox::Cancel);
       break;
   }
+  // Each with its access key (the box takes the letter alone too).
   for (const auto& [button, caption] :
-       {std::pair{QMessageBox::Yes, kYes}, std::pair{QMessageBox::No, kNo},
-        std::pair{QMessageBox::Ok, kOk}, std::pair{QMessageBox::Cancel, kCancel}}) {
+       {std::pair{QMessageBox::Yes, kYesKeyed}, std::pair{QMessageBox::No, kNoKeyed},
+        std::pair{QMessageBox::Ok, kOkKeyed}, std::pair{QMessageBox::Cancel, kCancelKeyed}}) {
     if (QAbstractButton* shown = box.button(button)) shown->setText(Q(caption));
+  }
+  if (question.viewReport) {
+    // Answers Yes: the error report opens once the box is gone.
+    QPushButton* view = box.addButton(Q(kViewReportKeyed), QMessageBox::YesRole);
+    view->setObjectName(QStringLiteral("viewReport"));
+    const std::function<void()> viewReport = question.viewReport;
+    QObject::connect(view, &QPushButton::clicked, &box, [viewReport] { viewReport(); });
   }
   if (!question.folder.isEmpty()) {
     // Opens the products' folder; the box stays for its answer.
-    QPushButton* open = box.addButton(Q(kOpenFolder), QMessageBox::ActionRole);
+    QPushButton* open = box.addButton(Q(kOpenFolderKeyed), QMessageBox::ActionRole);
     open->setObjectName(QStringLiteral("openFolder"));
     open->disconnect(&box);
     if (auto* buttons = box.findChild<QDialogButtonBox*>()) open->disconnect(buttons);
@@ -87,6 +95,10 @@ MsgAnswer ShowMessageBox(QWidget* parent, const Question& question) {
   QMessageBox box(parent);
   SetUpMessageBox(box, question);
   const int answer = box.exec();
+  if (box.clickedButton() != nullptr &&
+      box.clickedButton()->objectName() == QLatin1String("viewReport")) {
+    return question.buttons == MsgButtons::Ok ? MsgAnswer::Ok : MsgAnswer::Yes;
+  }
   switch (question.buttons) {
     case MsgButtons::Ok:
       return MsgAnswer::Ok;

@@ -25,6 +25,8 @@ struct Question {
   // A folder that a button of the box opens, the box staying (the run's
   // products); empty for none.
   QString folder;
+  // A button "Xem File lỗi": it answers Yes and calls this; none when empty.
+  std::function<void()> viewReport;
 };
 
 class Asker {
@@ -37,7 +39,7 @@ class Asker {
   MsgAnswer operator()(const Question& question) const;
   MsgAnswer operator()(const QString& text, MsgIcon icon, MsgButtons buttons,
                        bool defaultNo = false) const {
-    return (*this)(Question{text, icon, buttons, defaultNo, {}});
+    return (*this)(Question{text, icon, buttons, defaultNo, {}, {}});
   }
   void setHook(Hook hook) { hook_ = std::move(hook); }
   void setParent(QWidget* parent) { parent_ = parent; }

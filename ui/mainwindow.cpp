@@ -1,5 +1,6 @@
 #include "ui/mainwindow.h"
 
+#include <QAbstractButton>
 #include <QApplication>
 #include <QCheckBox>
 #include <QCloseEvent>
@@ -17,6 +18,7 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QMimeData>
+#include <QPlainTextEdit>
 #include <QProgressBar>
 #include <QPushButton>
 #include <QTextBrowser>
@@ -27,6 +29,7 @@
 
 #include "core/messages.h"
 #include "core/tcvn3.h"
+#include "core/typed_numbers.h"
 #include "import/dispatch.h"
 #include "ui/editor.h"
 #include "ui/lists.h"
@@ -91,6 +94,23 @@ void RestoreBox(QCheckBox* box, const QString& stored) {
 }
 
 std::string Std(const QString& text) { return text.toStdString(); }
+
+// The caption with an access key before the first letter key (the same case
+// first, then either).
+QString WithAccessKey(QString caption, char key) {
+  qsizetype at = caption.indexOf(QLatin1Char(key), 0, Qt::CaseSensitive);
+  if (at < 0) at = caption.indexOf(QLatin1Char(key), 0, Qt::CaseInsensitive);
+  if (at >= 0) caption.insert(at, QLatin1Char('&'));
+  return caption;
+}
+
+// The same file, however its path is written.
+bool SamePath(const QString& a, const QString& b) {
+  if (a.isEmpty() || b.isEmpty()) return false;
+  const QFileInfo left(a), right(b);
+  if (left.exists() && right.exists()) return left.canonicalFilePath() == right.canonicalFilePath();
+  return QDir::cleanPath(left.absoluteFilePath()) == QDir::cleanPath(right.absoluteFilePath());
+}
 
 // The recent files: a key of their own, the paths one a line.
 constexpr const char* kRecentKey = "KAVU_Recent";
@@ -299,6 +319,39 @@ void MainWindow::buildControls() {
   grid->setColumnStretch(0, 1);
   grid->setColumnStretch(1, 1);
   buildRunControls();
+  // The header form opens from its own button beside the field-sketch box.
+  auto* headerButton = MakeButton(luachon, "nhapsdoButton", Q(kHeaderButton));
+  headerButton->setAutoDefault(false);
+  const int sketchRow = options->indexOf(fsdo_);
+  options->removeWidget(fsdo_);
+  auto* sketchLine = new QHBoxLayout;
+  sketchLine->addWidget(fsdo_, 1);
+  sketchLine->addWidget(headerButton);
+  options->insertLayout(sketchRow, sketchLine);
+  connect(headerButton, &QPushButton::clicked, this, &MainWindow::nhapsdo_Click);
+  label1->setBuddy(TyleTXT_);
+  label2->setBuddy(Htxt_);
+  label3->setBuddy(txtSoleDC_);
+  lbkieu->setBuddy(cbkieu_);
+  lbfile->setBuddy(txtfile_);
+  for (const auto& [name, key] : kMainAccessKeys) {
+    QObject* control = findChild<QObject*>(Q(name));
+    if (auto* button = qobject_cast<QAbstractButton*>(control)) {
+      button->setText(WithAccessKey(button->text(), key));
+    } else if (auto* label = qobject_cast<QLabel*>(control)) {
+      label->setText(WithAccessKey(label->text(), key));
+    }
+  }
+  for (const auto& [name, tip] : kMainToolTips) {
+    if (auto* control = findChild<QWidget*>(Q(name))) control->setToolTip(Q(tip));
+  }
+  // The buttons in the order they stand: the map button after the compute
+  // button, the exit button last.
+  QWidget::setTabOrder(tinh, bando_);
+  QWidget::setTabOrder(bando_, suasolieu);
+  QWidget::setTabOrder(suasolieu, trogiup);
+  QWidget::setTabOrder(trogiup, thoat);
+  QWidget::setTabOrder(thoat, ckBando_);
   resize(760, 520);
 
   connect(cbkieu_, &QComboBox::activated, this, &MainWindow::cbkieu_Click);
@@ -507,18 +560,77 @@ void MainWindow::collectWindowFields() {
   }
 }
 
+bool MainWindow::typedNumbersRead() {
+  const TypedRunNumbersRead read = ReadRunNumbers(Std(TyleTXT_->currentText()), Std(Htxt_->text()),
+                                                  Std(txtSoleDC_->text()));
+  if (read.numbers) return true;
+  tbao_ = ask_(Q(TypedRefusalMessage(read)), MsgIcon::Critical, MsgButtons::Ok);
+  QWidget* box = TyleTXT_;
+  if (read.refused == TypedBox::TextHeight) box = Htxt_;
+  if (read.refused == TypedBox::HeightDecimals) box = txtSoleDC_;
+  box->setFocus();
+  if (auto* edit = qobject_cast<QLineEdit*>(box)) edit->selectAll();
+  if (box == TyleTXT_ && TyleTXT_->lineEdit() != nullptr) TyleTXT_->lineEdit()->selectAll();
+  return false;
+}
+
+bool MainWindow::unsavedEditsSettled() {
+  // The files the run reads: the chosen one and the common control file.
+  QStringList read{Q(st_.filesl)};
+  if (Ticked(BoxState(ckKC_))) read.append(txtFKC_->text().trimmed());
+  struct Shown {
+    QPlainTextEdit* text;
+    QString file;
+    std::function<void()> save;
+  };
+  for (const Shown& shown : {Shown{suasl_->txtsuasl(), suasl_->file(), [this] { suasl_->ghi_Click(); }},
+                             Shown{xem_->txtxem(), xem_->file(), [this] { xem_->ghixem_Click(); }}}) {
+    if (!shown.text->document()->isModified()) continue;
+    bool readByRun = false;
+    for (const QString& path : read) readByRun = readByRun || SamePath(shown.file, path);
+    if (!readByRun) continue;
+    tbao_ = ask_(Q(kSaveChanges) + QDir::toNativeSeparators(shown.file) + QStringLiteral("?"),
+                 MsgIcon::Question, MsgButtons::YesNoCancel);
+    if (tbao_ == MsgAnswer::Cancel) return false;
+    if (tbao_ == MsgAnswer::Yes) {
+      shown.save();
+      // Not saved: nothing is computed (the save said why).
+      if (shown.text->document()->isModified()) return false;
+    }
+  }
+  return true;
+}
+
 void MainWindow::tinh_Click() {
   if (running_ || ending_) return;
   takeTypedFile();
+  if (!typedNumbersRead() || !unsavedEditsSettled()) return;
   collectWindowFields();
+  viewReportAfterRun_ = false;
+  const QString chosen = txtfile_->text();
   lastRun_ = computeOffThread();
+  if (lastRun_.outcome != RunOutcome::Completed) {
+    // The window is itself again; a file that could not be computed leaves
+    // the recent list.
+    setWindowTitle(Q(msg::kProgramTitle));
+    if (lastRun_.outcome != RunOutcome::Cancelled) {
+      recent_.removeAll(chosen);
+      recent_.removeAll(Q(st_.filesl));
+    }
+  }
   if (lastRun_.outcome == RunOutcome::Completed && lastRun_.answer == MsgAnswer::No) {
     // No to "continue?" ends the program; the session's choices are kept.
-    if (!editsSettled()) return;
-    writeSettingsOnce();
-    endProgram();
+    if (editsSettled()) {
+      writeSettingsOnce();
+      endProgram();
+      return;
+    }
   }
   afterRun();
+  if (std::exchange(viewReportAfterRun_, false)) {
+    const QString report = Q(st_.daufile + ".err");
+    if (const std::optional<QString> text = ReadScreenText(report)) xem_->showFile(report, *text);
+  }
 }
 
 Nhapsdo& MainWindow::headerForm() {
@@ -528,9 +640,14 @@ Nhapsdo& MainWindow::headerForm() {
 
 void MainWindow::fsdo_Click() {
   if (BoxState(fsdo_) != 1) return;
+  nhapsdo_Click();
+}
+
+void MainWindow::nhapsdo_Click() {
   Nhapsdo& form = headerForm();
   form.show();
   form.raise();
+  form.activateWindow();
 }
 
 void MainWindow::KC_Click() {
@@ -627,9 +744,17 @@ void MainWindow::closeEvent(QCloseEvent* event) {
 }
 
 MsgAnswer MainWindow::MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) {
-  Question question{Q(text), icon, buttons, false, {}};
-  // The run's summary offers the folder of its products.
-  if (text.starts_with(msg::kTotalStations)) question.folder = Q(st_.tentm);
+  Question question{Q(text), icon, buttons, false, {}, {}};
+  // The run's summary offers the folder of its products and, when it found
+  // errors, the error report; the run is over behind it.
+  if (text.starts_with(msg::kTotalStations)) {
+    question.folder = Q(st_.tentm);
+    if (st_.err > 0 && QFileInfo(Q(st_.daufile + ".err")).isFile()) {
+      question.viewReport = [this] { viewReportAfterRun_ = true; };
+    }
+    tiendo_->hide();
+    dung_->hide();
+  }
   tbao_ = ask_(question);
   return tbao_;
 }

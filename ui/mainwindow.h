@@ -86,6 +86,8 @@ class MainWindow : public Window, public Host {
   void lstfile_DblClick(QListWidgetItem* item);
   void tinh_Click();
   void fsdo_Click();
+  // The button beside the field-sketch box: the header form.
+  void nhapsdo_Click();
   void KC_Click();
   void suasolieu_Click();
   void trogiup_Click();
@@ -116,6 +118,12 @@ class MainWindow : public Window, public Host {
   void setKind(int index);
   void setDrive(int index);
   void collectWindowFields();
+  // The scale, label height and decimals as typed can be read; otherwise the
+  // box is named in a message and takes the focus.
+  bool typedNumbersRead();
+  // Unsaved edits of a file the run reads saved (Có), left (Không) or the
+  // run not made (Hủy: false).
+  bool unsavedEditsSettled();
   void writeSettingsOnce();
   void endProgram();
   // Unsaved edits of the editor and the viewer saved or dropped as the user
@@ -144,6 +152,7 @@ class MainWindow : public Window, public Host {
   bool ending_ = false;
   bool running_ = false;
   bool focusFileBoxAfterRun_ = false;
+  bool viewReportAfterRun_ = false;  // "Xem File lỗi" pressed in the summary
   QStringList recent_;
 
   DriveList* lstdia_ = nullptr;

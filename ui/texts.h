@@ -3,6 +3,7 @@
 #pragma once
 
 #include <array>
+#include <utility>
 #include <string_view>
 
 namespace kavu::ui {
@@ -23,6 +24,13 @@ inline constexpr std::string_view kFileType = "Kiểu File:";
 inline constexpr std::string_view kAllFiles = "Mọi File (*)";
 inline constexpr std::string_view kErrFiles = "File báo lỗi (*.err)";
 inline constexpr std::string_view kOpenFolder = "Mở thư mục";
+// The message boxes' buttons with their access keys.
+inline constexpr std::string_view kYesKeyed = "&Có";
+inline constexpr std::string_view kNoKeyed = "&Không";
+inline constexpr std::string_view kOkKeyed = "Đồng &ý";
+inline constexpr std::string_view kCancelKeyed = "&Hủy";
+inline constexpr std::string_view kOpenFolderKeyed = "&Mở thư mục";
+inline constexpr std::string_view kViewReportKeyed = "&Xem File lỗi";
 inline constexpr std::array<std::string_view, 4> kFileColumns = {"Tên", "Cỡ", "Kiểu", "Ngày sửa"};
 
 // Main window.
@@ -65,6 +73,49 @@ inline constexpr std::string_view kExitQuestion = "Bạn có muốn thoát khỏ
 inline constexpr std::string_view kStopRun = "Dừng tính";
 inline constexpr std::string_view kChooseKcFile = "File KC";
 inline constexpr std::string_view kRecent = "Gần đây";
+// Beside the field-sketch box: opens the header form.
+inline constexpr std::string_view kHeaderButton = "Nhập...";
+// After the run's summary: the error report in the viewer.
+inline constexpr std::string_view kViewReport = "Xem File lỗi";
+// What each control of the main window is for (its tool tip), by object name.
+inline constexpr std::array<std::pair<std::string_view, std::string_view>, 26> kMainToolTips = {{
+    {"lstdia", "Ổ đĩa chứa số liệu"},
+    {"lsttm", "Thư mục chứa số liệu; bấm đúp để mở"},
+    {"cbkieu", "Loại số liệu: sổ đo ASC, hoặc File của máy đo, được chuyển thành sổ đo trước khi tính"},
+    {"lstfile", "Bấm để chọn File, bấm đúp để tính ngay"},
+    {"txtfile", "File số liệu sẽ tính; có thể gõ đường dẫn vào đây"},
+    {"recent", "Các File đã chọn gần đây"},
+    {"fasc", "Ghi lại sổ đo vào thư mục TRIDO và File .td1 (trị đo và toạ độ)"},
+    {"ftd", "Ghi File toạ độ .txt của các điểm chi tiết"},
+    {"fdc", "Tính độ cao các điểm chi tiết; bỏ chọn thì chỉ tính toạ độ"},
+    {"fsdo", "Ghi File sổ đo .sdo. Ô màu xám: chưa chọn lần nào trong phiên này, "
+             "coi như không chọn; bấm một lần để chọn"},
+    {"nhapsdoButton", "Nhập thông tin về sổ đo: khu đo, máy đo, người đo, ngày đo ..."},
+    {"fdxf", "Ghi File bản vẽ .dxf. Ô màu xám: chưa chọn lần nào trong phiên này, "
+             "coi như không chọn; bấm một lần để chọn"},
+    {"fcp", "Ghi File cọc phụ .cp"},
+    {"fkc", "Ghi File toạ độ các điểm khống chế đã dùng .kc"},
+    {"TyleTXT", "Tỷ lệ bản đồ: 500, 1:500 hoặc 1/500; quyết định hạn sai cạnh định hướng"},
+    {"Htxt", "Chiều cao chữ trên bản vẽ DXF, mm trên giấy: 2.5 hoặc 2,5"},
+    {"txtSoleDC", "Số chữ số lẻ của độ cao trong File .txt, từ 0 đến 10"},
+    {"ckKC", "Lấy điểm khống chế từ File KC chung, không từ sổ đo"},
+    {"txtFKC", "File điểm khống chế chung"},
+    {"KC", "Chọn File điểm khống chế chung"},
+    {"tinh", "Tính toạ độ, độ cao các điểm và ghi các File đã chọn"},
+    {"bando", "Xem bản đồ của lần tính gần nhất"},
+    {"suasolieu", "Mở File đang chọn để sửa"},
+    {"trogiup", "Xem trợ giúp của chương trình"},
+    {"thoat", "Thoát khỏi chương trình"},
+    {"dung", "Dừng tính: các File đã có được giữ nguyên"},
+}};
+// The access key of each control (the letter underlined in its caption).
+inline constexpr std::array<std::pair<std::string_view, char>, 20> kMainAccessKeys = {{
+    {"tinh", 'T'},  {"suasolieu", 'S'}, {"trogiup", 'g'}, {"thoat", 'o'},
+    {"bando", 'B'}, {"fasc", 'A'},      {"ftd", 'X'},     {"fdc", 'h'},
+    {"fsdo", 'F'},  {"fdxf", 'D'},      {"fcp", 'p'},     {"fkc", 'K'},
+    {"ckKC", 'u'},  {"KC", 'i'},        {"Label1", 'l'},  {"Label2", 'm'},
+    {"Label3", 'C'}, {"lbkieu", 'y'},   {"lbfile", 'e'},  {"nhapsdoButton", 'N'},
+}};
 
 // Field-book header form.
 inline constexpr std::string_view kHeaderCaption = "Nhập thông tin về sổ đo";

@@ -371,8 +371,8 @@ class WindowTest : public QObject {
 
     QMessageBox box;
     const QString question = Q(kSaveChanges) + QStringLiteral("/data/job1.asc?");
-    SetUpMessageBox(box, {question, MsgIcon::Question, MsgButtons::YesNoCancel, false, {}});
-    QCOMPARE(box.button(QMessageBox::Cancel)->text(), Q("Hủy"));
+    SetUpMessageBox(box, {question, MsgIcon::Question, MsgButtons::YesNoCancel, false, {}, {}});
+    QCOMPARE(box.button(QMessageBox::Cancel)->text(), Q("&Hủy"));
     box.show();
     QVERIFY(box.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-save-question.png")));
     QFileDialog dialog(nullptr, Q(kViewFile), desk.work.path());
