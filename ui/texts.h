@@ -78,7 +78,7 @@ inline constexpr std::string_view kHeaderButton = "Nhập...";
 // After the run's summary: the error report in the viewer.
 inline constexpr std::string_view kViewReport = "Xem File lỗi";
 // What each control of the main window is for (its tool tip), by object name.
-inline constexpr std::array<std::pair<std::string_view, std::string_view>, 26> kMainToolTips = {{
+inline constexpr std::array<std::pair<std::string_view, std::string_view>, 27> kMainToolTips = {{
     {"lstdia", "Ổ đĩa chứa số liệu"},
     {"lsttm", "Thư mục chứa số liệu; bấm đúp để mở"},
     {"cbkieu", "Loại số liệu: sổ đo ASC, hoặc File của máy đo, được chuyển thành sổ đo trước khi tính"},
@@ -103,6 +103,7 @@ inline constexpr std::array<std::pair<std::string_view, std::string_view>, 26> k
     {"KC", "Chọn File điểm khống chế chung"},
     {"tinh", "Tính toạ độ, độ cao các điểm và ghi các File đã chọn"},
     {"bando", "Xem bản đồ của lần tính gần nhất"},
+    {"ckBando", "Mở bản đồ ngay sau mỗi lần tính"},
     {"suasolieu", "Mở File đang chọn để sửa"},
     {"trogiup", "Xem trợ giúp của chương trình"},
     {"thoat", "Thoát khỏi chương trình"},

@@ -1,0 +1,241 @@
+// A working day in the window: the numbers a surveyor types read as the batch
+// command reads them, unsaved edits of the field book never computed unasked,
+// the summary that leads to the error report, a failed file that leaves the
+// recent list, and a window worked from the keyboard.
+#include <QAbstractButton>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QDir>
+#include <QLabel>
+#include <QLineEdit>
+#include <QPlainTextEdit>
+#include <QProgressBar>
+#include <QPushButton>
+#include <QtTest>
+#include <set>
+#include <sstream>
+
+#include "cli/cli.h"
+#include "core/messages.h"
+#include "core/typed_numbers.h"
+#include "support.h"
+#include "ui/editor.h"
+#include "ui/lists.h"
+#include "ui/mainwindow.h"
+#include "ui/nhapsdo.h"
+
+using namespace kavu;
+using namespace kavu::ui;
+using namespace kavu::ui::test;
+
+namespace {
+
+// The example in the desk's folder, chosen as a click in the list chooses it.
+void ChooseExample(Desk& desk, const QByteArray& extra = {}) {
+  desk.write("job1.asc", ReadAll(QStringLiteral(KAVU_EXAMPLES "/job1.asc")) + extra);
+  QVERIFY(Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path()));
+  QVERIFY(desk.w.chooseFile(desk.path("job1.asc")));
+}
+
+int BatchExit(const std::vector<std::string>& args) {
+  const std::vector<std::string_view> views(args.begin(), args.end());
+  std::ostringstream out, err;
+  return RunCli(views, out, err, false);
+}
+
+bool IsSummary(const Question& question) {
+  return question.text.startsWith(Q(msg::kTotalStations));
+}
+
+}  // namespace
+
+class DayTest : public QObject {
+  Q_OBJECT
+
+  QTemporaryDir store_;
+
+ private slots:
+  void init() { UseScratchSettings(store_); }
+
+  // The same texts give the same answer in the window and the batch command;
+  // a refused one names its box, takes the focus there and writes nothing;
+  // read ones give the same drawing.
+  void typedNumbersReadAsTheBatchCommandReadsThem() {
+    struct Case {
+      const char *scale, *height, *decimals;
+      const char* box;  // the box refused, or none
+    };
+    const std::vector<Case> cases = {
+        {"1:500", "2,5", "3", nullptr},  {"1/2000", " 1.5 ", "2", nullptr},
+        {"1:5OO", "2.0", "2", "TyleTXT"}, {"500", "2,5,0", "2", "Htxt"},
+        {"1.000", "2", "2", "TyleTXT"},  {"500", "0", "2", "Htxt"},
+        {"500", "2", "hai", "txtSoleDC"},
+    };
+    for (const Case& c : cases) {
+      Desk desk;
+      desk.w.show();
+      ChooseExample(desk);
+      Child<QComboBox>(desk.w, "TyleTXT")->setCurrentText(QLatin1String(c.scale));
+      Child<QLineEdit>(desk.w, "Htxt")->setText(QLatin1String(c.height));
+      Child<QLineEdit>(desk.w, "txtSoleDC")->setText(QLatin1String(c.decimals));
+      Child<QCheckBox>(desk.w, "fdxf")->click();
+      const QStringList before = QDir(desk.work.path()).entryList(QDir::Files);
+      desk.w.tinh_Click();
+      const std::string copy = desk.path("batch.asc").toStdString();
+      QVERIFY(QFile::copy(desk.path("job1.asc"), Q(copy)));
+      const int exit = BatchExit(
+          {"--dxf", "--scale", c.scale, "--text-height", c.height, "--height-decimals", c.decimals, copy});
+      QVERIFY(!desk.person.asked.empty());
+      if (c.box != nullptr) {
+        QCOMPARE(exit, kExitUsage);
+        QCOMPARE(desk.person.asked.size(), std::size_t{1});
+        const QString wanted = Q(TypedRefusalMessage(ReadRunNumbers(c.scale, c.height, c.decimals)));
+        QCOMPARE(desk.person.asked.back().text, wanted);
+        QVERIFY(wanted.endsWith(QLatin1String(c.box == std::string("TyleTXT") ? c.scale
+                                              : c.box == std::string("Htxt")  ? c.height
+                                                                               : c.decimals)));
+        QWidget* focused = desk.w.focusWidget();
+        QVERIFY(focused != nullptr);
+        const bool inBox = focused->objectName() == QLatin1String(c.box) ||
+                           (focused->parent() != nullptr &&
+                            focused->parent()->objectName() == QLatin1String(c.box));
+        QVERIFY2(inBox, qPrintable(focused->objectName()));
+        QStringList after = QDir(desk.work.path()).entryList(QDir::Files);
+        after.removeAll(QStringLiteral("batch.asc"));
+        QCOMPARE(after, before);
+      } else {
+        QCOMPARE(exit, kExitOk);
+        QVERIFY(IsSummary(desk.person.asked.back()));
+        QCOMPARE(desk.read("job1.dxf"), desk.read("batch.dxf"));
+        QVERIFY(!desk.read("job1.dxf").isEmpty());
+      }
+    }
+  }
+
+  // Unsaved edits of the field book to compute: Có saves and computes them,
+  // Không computes the file on disk and keeps the edits, Hủy computes nothing.
+  void unsavedEditsAreSavedLeftOrNotComputed() {
+    for (const MsgAnswer answer : {MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}) {
+      Desk desk;
+      desk.w.show();
+      ChooseExample(desk);
+      desk.w.suasolieu_Click();
+      QPlainTextEdit* text = desk.w.editor().txtsuasl();
+      const QByteArray onDisk = desk.read("job1.asc");
+      QTextCursor cursor = text->document()->find(QStringLiteral("DC01 1.45"));
+      QVERIFY(!cursor.isNull());
+      cursor.insertText(QStringLiteral("DC01 1.55"));
+      desk.person.answers = {answer};
+      desk.w.tinh_Click();
+      QCOMPARE(desk.person.asked.at(0).text.startsWith(Q(kSaveChanges)), true);
+      QCOMPARE(desk.person.asked.at(0).buttons, MsgButtons::YesNoCancel);
+      const bool computed = desk.person.asked.size() > 1 && IsSummary(desk.person.asked.back());
+      QCOMPARE(computed, answer != MsgAnswer::Cancel);
+      QCOMPARE(desk.read("job1.asc") == onDisk, answer != MsgAnswer::Yes);
+      QCOMPARE(text->document()->isModified(), answer != MsgAnswer::Yes);
+      QCOMPARE(QFileInfo::exists(desk.path("job1.txt")), computed);
+    }
+  }
+
+  // A run with errors offers the error report, which opens in the viewer;
+  // behind the summary the run's progress and stop button are gone. A run
+  // without errors offers none.
+  void theSummaryLeadsToTheErrorReport() {
+    for (const bool errors : {true, false}) {
+      Desk desk;
+      desk.w.show();
+      ChooseExample(desk, errors ? QByteArray("P99 0901500\r\n") : QByteArray());
+      bool offered = false, runControlsShown = true;
+      desk.w.asker().setHook([&](const Question& question) {
+        desk.person.asked.push_back(question);
+        if (!IsSummary(question)) return MsgAnswer::Ok;
+        runControlsShown = Child<QProgressBar>(desk.w, "tiendo")->isVisible() ||
+                           Child<QPushButton>(desk.w, "dung")->isVisible();
+        offered = bool(question.viewReport);
+        if (question.viewReport) question.viewReport();
+        return MsgAnswer::Yes;
+      });
+      desk.w.tinh_Click();
+      QVERIFY(IsSummary(desk.person.asked.back()));
+      QVERIFY(!runControlsShown);
+      QCOMPARE(offered, errors);
+      QCOMPARE(desk.w.viewer().isVisible(), errors);
+      if (errors) {
+        QCOMPARE(QFileInfo(desk.w.viewer().file()).fileName(), QStringLiteral("job1.err"));
+        QVERIFY(desk.w.viewer().txtxem()->toPlainText().contains(QLatin1String("P99")));
+      }
+      QVERIFY(Child<QPushButton>(desk.w, "bando")->isEnabled());
+    }
+  }
+
+  // A file that cannot be computed leaves the recent list, and the title
+  // says no more that the run is at work.
+  void aFailedFileLeavesTheRecentList() {
+    Desk desk;
+    desk.w.show();
+    ChooseExample(desk);
+    desk.write("empty.asc", "");
+    QVERIFY(desk.w.chooseFile(desk.path("empty.asc")));
+    QVERIFY(desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("empty.asc"))));
+    desk.w.tinh_Click();
+    QCOMPARE(desk.w.lastRun().outcome, RunOutcome::NotStarted);
+    QVERIFY(!desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("empty.asc"))));
+    QVERIFY(desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("job1.asc"))));
+    QCOMPARE(desk.w.windowTitle(), Q(msg::kProgramTitle));
+  }
+
+  // No to "continue?" and Hủy to saving the editor's edits: the program stays
+  // and its map button works.
+  void cancellingTheWayOutKeepsTheMap() {
+    Desk desk;
+    desk.w.show();
+    ChooseExample(desk);
+    desk.write("other.asc", "TR A 1 2 3\r\n");
+    desk.w.suasolieu_Click();
+    desk.w.editor().openFile(desk.path("other.asc"), desk.path("other"), desk.work.path(),
+                             QStringLiteral("TR A 1 2 3\n"));
+    desk.w.editor().txtsuasl()->appendPlainText(QStringLiteral("TR B 4 5 6"));
+    desk.person.answers = {MsgAnswer::No, MsgAnswer::Cancel};
+    desk.w.tinh_Click();
+    QVERIFY(!desk.ended);
+    QVERIFY(desk.w.isVisible());
+    QVERIFY(Child<QPushButton>(desk.w, "bando")->isEnabled());
+  }
+
+  // Every option explains itself; no two controls share an access key; the
+  // buttons are reached with Tab in the order they stand; the header form
+  // opens from its button.
+  void theWindowWorksFromTheKeyboard() {
+    Desk desk;
+    desk.w.show();
+    std::set<QChar> keys;
+    for (QWidget* control : desk.w.findChildren<QWidget*>()) {
+      QString text;
+      if (auto* button = qobject_cast<QAbstractButton*>(control)) text = button->text();
+      if (auto* label = qobject_cast<QLabel*>(control)) text = label->text();
+      const qsizetype at = text.indexOf(QLatin1Char('&'));
+      if (at >= 0 && at + 1 < text.size()) {
+        QVERIFY2(keys.insert(text[at + 1].toLower()).second, qPrintable(text));
+      }
+      const bool option = qobject_cast<QAbstractButton*>(control) != nullptr ||
+                          qobject_cast<QLineEdit*>(control) != nullptr ||
+                          qobject_cast<QComboBox*>(control) != nullptr;
+      if (option && !control->objectName().isEmpty() && control->parent() != nullptr &&
+          qobject_cast<QComboBox*>(control->parent()) == nullptr) {
+        QVERIFY2(!control->toolTip().isEmpty(), qPrintable(control->objectName()));
+      }
+    }
+    QVERIFY(keys.size() >= 15);
+    // The map button comes before the exit button.
+    QWidget* at = Child<QPushButton>(desk.w, "tinh");
+    QStringList order;
+    for (int i = 0; i < 8; ++i, at = at->nextInFocusChain()) order << at->objectName();
+    QVERIFY2(order.indexOf(QStringLiteral("bando")) < order.indexOf(QStringLiteral("thoat")),
+             qPrintable(order.join(QLatin1Char(' '))));
+    Child<QPushButton>(desk.w, "nhapsdoButton")->click();
+    QVERIFY(desk.w.headerFormLoaded() && desk.w.headerForm().isVisible());
+  }
+};
+
+QTEST_MAIN(DayTest)
+#include "day_test.moc"
