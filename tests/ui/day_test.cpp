@@ -8,6 +8,7 @@
 #include <QDir>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMessageBox>
 #include <QPlainTextEdit>
 #include <QProgressBar>
 #include <QPushButton>
@@ -152,7 +153,14 @@ class DayTest : public QObject {
         runControlsShown = Child<QProgressBar>(desk.w, "tiendo")->isVisible() ||
                            Child<QPushButton>(desk.w, "dung")->isVisible();
         offered = bool(question.viewReport);
-        if (question.viewReport) question.viewReport();
+        if (question.viewReport) {
+          QMessageBox box;
+          SetUpMessageBox(box, question);
+          box.show();
+          QApplication::processEvents();
+          box.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-summary-errors.png"));
+          question.viewReport();
+        }
         return MsgAnswer::Yes;
       });
       desk.w.tinh_Click();
@@ -234,6 +242,8 @@ class DayTest : public QObject {
              qPrintable(order.join(QLatin1Char(' '))));
     Child<QPushButton>(desk.w, "nhapsdoButton")->click();
     QVERIFY(desk.w.headerFormLoaded() && desk.w.headerForm().isVisible());
+    QVERIFY(desk.w.headerForm().grab().save(QStringLiteral(KAVU_PICTURES "/kavu-header-form.png")));
+    QVERIFY(desk.w.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-main-options.png")));
   }
 };
 
