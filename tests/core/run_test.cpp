@@ -187,5 +187,32 @@ TEST(Run, StopWorksUntilTheProductsAreInPlace) {
   }
 }
 
+// A product that cannot be written is named with its reason under a warning;
+// the error report is named only when the run found errors.
+TEST(Run, AnUnwritableProductIsNamedWithItsReason) {
+  const fs::path folder = FreshFolder();
+  fs::create_directories(folder / "data");
+  fs::copy_file(fs::path(KAVU_EXAMPLES) / "job1.asc", folder / "data" / "job1.asc");
+  fs::create_directories(folder / "data" / "job1.txt");
+  struct IconHost : RecordingHost {
+    MsgIcon last = MsgIcon::None;
+    MsgAnswer MessageBox(std::string_view text, MsgIcon icon, MsgButtons buttons) override {
+      last = icon;
+      return RecordingHost::MessageBox(text, icon, buttons);
+    }
+  } host;
+  RunState st = StateFor(folder / "data" / "job1.asc");
+  const RunResult result = tinh_Click(st, host);
+  ASSERT_EQ(result.outcome, RunOutcome::Completed);
+  EXPECT_EQ(result.err, 0);
+  EXPECT_EQ(host.last, MsgIcon::Exclamation);
+  const std::string txt = (folder / "data" / "job1.txt").string();
+  EXPECT_EQ(result.unwritable,
+            std::vector<std::string>{txt + " (" + std::string(msg::kIsAFolder) + ")"});
+  EXPECT_NE(host.messages.back().find(std::string(msg::kCannotWrite) + txt + " ("),
+            std::string::npos);
+  EXPECT_EQ(host.messages.back().find(".err"), std::string::npos);
+}
+
 }  // namespace
 }  // namespace kavu
