@@ -192,6 +192,23 @@ class DayTest : public QObject {
     QCOMPARE(desk.w.windowTitle(), Q(msg::kProgramTitle));
   }
 
+  // An instrument file whose field book cannot be written is computed all the
+  // same, and the file box stays on it: no field book stands beside it.
+  void anUnwrittenConversionKeepsTheInstrumentFile() {
+    Desk desk;
+    desk.w.show();
+    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/instruments/job-sdr.sdr"),
+                        desk.path("job.sdr")));
+    QVERIFY(QDir(desk.work.path()).mkdir(QStringLiteral("job.asc")));
+    QVERIFY(desk.w.chooseFile(desk.path("job.sdr")));
+    desk.w.tinh_Click();
+    QCOMPARE(desk.w.lastRun().outcome, RunOutcome::Completed);
+    QVERIFY(!desk.w.lastRun().unwritable.empty());
+    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(),
+             QDir::toNativeSeparators(desk.path("job.sdr")));
+    QCOMPARE(desk.person.asked.back().icon, MsgIcon::Exclamation);
+  }
+
   // No to "continue?" and Hủy to saving the editor's edits: the program stays
   // and its map button works.
   void cancellingTheWayOutKeepsTheMap() {
