@@ -19,6 +19,7 @@
 #include "core/state.h"
 #include "core/tcvn3.h"
 #include "core/typed_numbers.h"
+#include "import/formats.h"
 #include "run/run.h"
 #ifdef KAVU_CLI_PICTURES
 #include "cli/pictures.h"
@@ -133,8 +134,19 @@ class BatchHost : public Host {
 
 std::optional<int> ParseKind(std::string_view text) {
   if (text == "auto") return -1;
-  if (text.size() == 1 && text[0] >= '0' && text[0] <= '9') return text[0] - '0';
-  return std::nullopt;
+  return FormatIndexOf(text);
+}
+
+// The kinds for --help, from the table of formats: "0 asc field book, ...".
+std::string KindsHelp() {
+  std::string help = "kind of FILE (default: auto, from its extension), by number or name:";
+  int index = 0;
+  for (const Format& format : Formats()) {
+    help += (index % 2 == 0 ? "\n" : ";  ") + std::to_string(index) + " " + std::string(format.name) +
+            " " + std::string(format.about);
+    ++index;
+  }
+  return help;
 }
 
 std::optional<std::uint64_t> ParseSeed(std::string_view text) {
@@ -187,11 +199,8 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   app.add_option("--control-file", set.controlFile,
                  "take the control points from this common file, not from FILE")
       ->type_name("PATH");
-  app.add_option("--kind", set.kind,
-                 "kind of FILE (default: auto, from its extension): 0 field book,\n"
-                 "1 SDR, 2 Sokkia .obs, 3 SET, 4 RAW, 5 Topcom .idx,\n"
-                 "6 Topcom 226 .tcm, 7 GRE, 8 DN7, 9 other")
-      ->type_name("auto|0..9");
+  app.add_option("--kind", set.kind, KindsHelp())
+      ->type_name("auto|N|NAME");
   app.add_option("--scale", set.scale,
                  "map scale: 500, 1:500 or 1/500; sets the distance tolerance\n(default: 1000)")
       ->type_name("NUMBER");
@@ -246,7 +255,10 @@ int RunCli(std::span<const std::string_view> args, std::ostream& out, std::ostre
   }
 
   const std::optional<int> kind = ParseKind(set.kind);
-  if (!kind) return Usage(err, "--kind: expected auto or a number from 0 to 9, got: " + set.kind);
+  if (!kind) {
+    return Usage(err, "--kind: expected auto, a number from 0 to " +
+                          std::to_string(LastFormatIndex()) + " or a format's name, got: " + set.kind);
+  }
   // The window reads the same texts with the same reader.
   const TypedRunNumbersRead typed = ReadRunNumbers(set.scale, set.textHeight, set.heightDecimals);
   if (!typed.numbers) {

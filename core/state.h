@@ -25,7 +25,7 @@ inline bool Ticked(int state) { return state == 1; }
 // The values of the main window's controls that the run reads or sets.
 struct WindowFields {
   std::string txtfile;           // the chosen file's path, native
-  int cbkieu = 0;                // kind of input, 0 to 9
+  int cbkieu = 0;                // kind of input: its index in the table of formats
   int fasc = 0;                  // regenerated field book and companion file
   int ftd = 1;                   // coordinate text file
   int fdc = 1;                   // detail heights

@@ -1,9 +1,8 @@
 // The batch command's handling of its arguments, with a kind chosen by hand:
-// the first byte picks the kind (0 to 9), the bytes up to the first NUL are
-// options, one a line (only lines that begin with "-" are passed, so that the
-// products stay in the fuzzer's folder), and the rest is the chosen file,
-// named with the kind's extension.
-#include <array>
+// the first byte picks the kind of the table of formats, the bytes up to the
+// first NUL are options, one a line (only lines that begin with "-" are
+// passed, so that the products stay in the fuzzer's folder), and the rest is
+// the chosen file, named with the kind's extension (".dat" for any other).
 #include <cstddef>
 #include <cstdint>
 #include <filesystem>
@@ -14,21 +13,24 @@
 
 #include "cli/cli.h"
 #include "core/lines.h"
+#include "import/formats.h"
 #include "fuzz/run_every_product.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size) {
   static const std::filesystem::path folder = kavu::fuzzing::Folder("kavu_fuzz_cli");
-  static constexpr std::array<const char*, 10> kExtensions{".asc", ".sdr", ".obs", ".set", ".raw",
-                                                           ".idx", ".tcm", ".gre", ".dn7", ".dat"};
   if (size == 0) return 0;
-  const int kind = data[0] % 10;
+  const auto formats = kavu::Formats();
+  const int kind = data[0] % static_cast<int>(formats.size());
+  const kavu::Format& format = formats[static_cast<std::size_t>(kind)];
+  const std::string extension =
+      format.extension.empty() ? std::string(".dat") : "." + std::string(format.name);
   const std::string_view rest(reinterpret_cast<const char*>(data) + 1, size - 1);
   const std::size_t nul = rest.find('\0');
   const std::string_view options = rest.substr(0, nul);
   const std::string_view content = nul == std::string_view::npos ? "" : rest.substr(nul + 1);
 
   const std::filesystem::path file =
-      folder / (std::string("job") + kExtensions[static_cast<std::size_t>(kind)]);
+      folder / (std::string("job") + extension);
   kavu::fuzzing::WriteFile(file, content);
   std::vector<std::string> args{"--kind", std::to_string(kind), "--seed", "1"};
   for (const std::string& line : kavu::SplitLines(options)) {

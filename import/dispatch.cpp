@@ -8,29 +8,12 @@
 #include "core/paths.h"
 #include "core/text.h"
 #include "import/converters.h"
+#include "import/formats.h"
 
 namespace kavu {
 namespace fs = std::filesystem;
 
 namespace {
-
-struct Kind {
-  std::string_view extension;
-  std::string_view pattern;
-};
-
-constexpr std::array<Kind, 10> kKinds{{
-    {"ASC", "*.asc"},
-    {"SDR", "*.sdr"},
-    {"OBS", "*.obs"},
-    {"SET", "*.set"},
-    {"RAW", "*.raw"},
-    {"IDX", "*.idx"},
-    {"TCM", "*.tcm"},
-    {"GRE", "*.gre"},
-    {"DN7", "*.dn7"},
-    {"", "*.*"},
-}};
 
 // Widths of the header texts in the field sketch.
 constexpr std::array<std::size_t, 7> kHeaderWidths{39, 6, 19, 20, 17, 18, 10};
@@ -85,40 +68,7 @@ void RemoveLeftovers(const RunState& st) {
   }
 }
 
-using Converter = Conversion (*)(std::string_view content, int kind);
-
-// The converter of a kind; none for the kinds whose field book must exist.
-Converter ConverterOf(int kind) {
-  switch (kind) {
-    case 1:
-    case 7:
-      return ConvertSdr;
-    case 2:
-      return ConvertObs;
-    case 3:
-      return [](std::string_view content, int) { return ConvertSet(content); };
-    case 5:
-      return [](std::string_view content, int) { return ConvertIdx(content); };
-    case 6:
-      return [](std::string_view content, int) { return ConvertTcm(content); };
-    default:
-      return nullptr;
-  }
-}
-
 }  // namespace
-
-int KindOfExtension(std::string_view upperExtension) {
-  for (std::size_t k = 0; k + 1 < kKinds.size(); ++k) {
-    if (kKinds[k].extension == upperExtension) return static_cast<int>(k);
-  }
-  return 9;
-}
-
-std::string_view PatternOfKind(int kind) {
-  if (kind < 0 || kind > 9) return "*.*";
-  return kKinds[static_cast<std::size_t>(kind)].pattern;
-}
 
 void DeriveFileSelection(FileSelection& sel, std::string_view path) {
   sel.filesl = std::string(path);
@@ -157,8 +107,7 @@ std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* j
   }
   if (!ReadableFile(st, host, st.txtfile)) return std::nullopt;
   DeriveFileSelection(st, st.txtfile);
-  const int kind = st.kindOverride >= 0 && st.kindOverride <= 9
-                       ? st.kindOverride
+  const int kind = FormatAt(st.kindOverride) != nullptr ? st.kindOverride
                        : KindOfExtension(Upper(st.duoifile));
   st.cbkieu = kind;
   host.ShowFolder(st.tentm, PatternOfKind(kind));
@@ -179,7 +128,7 @@ std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* j
   // the one of the same base name for kinds without a converter. A converted
   // one never replaces a file that the run reads.
   const std::string fieldBook = kind == 0 ? st.filesl : st.daufile + ".asc";
-  const Converter convert = ConverterOf(kind);
+  const auto convert = FormatAt(kind)->convert;
   st.inputs = {st.filesl};
   if (Ticked(st.ckKC) && !Trim(st.txtFKC).empty()) st.inputs.push_back(Trim(st.txtFKC));
   if (convert) {

@@ -8,14 +8,9 @@
 
 #include "core/host.h"
 #include "core/state.h"
+#include "import/formats.h"
 
 namespace kavu {
-
-// Index in the kind list of an upper-case extension ("SDR" -> 1); 9 for any
-// other.
-int KindOfExtension(std::string_view upperExtension);
-// The file pattern of a kind ("*.sdr"); "*.*" outside 0 to 9.
-std::string_view PatternOfKind(int kind);
 
 // Sets filesl, tentm, daufile, duoifile, tentmbd and filesl1 from a path.
 // daufile and duoifile use the first and second "." of the file name.

@@ -214,7 +214,7 @@ void MainWindow::buildControls() {
   auto* lbkieu = MakeLabel(this, "lbkieu", kFilesOfType);
   cbkieu_ = new QComboBox(this);
   cbkieu_->setObjectName(QStringLiteral("cbkieu"));
-  for (std::string_view kind : kKinds) cbkieu_->addItem(Q(kind));
+  for (const Format& format : Formats()) cbkieu_->addItem(Q(format.listText));
   lstfile_ = new FileList(this);
   lstfile_->setObjectName(QStringLiteral("lstfile"));
   auto* lbfile = MakeLabel(this, "lbfile", kFile);
@@ -446,7 +446,7 @@ void MainWindow::setDrive(int index) {
 }
 
 void MainWindow::cbkieu_Click(int index) {
-  if (index < 0 || index > 9) return;
+  if (FormatAt(index) == nullptr) return;
   lstfile_->setPattern(Q(PatternOfKind(index)));
 }
 

@@ -59,13 +59,6 @@ inline constexpr std::string_view kHelp = "Trợ giúp";
 inline constexpr std::string_view kExit = "Thoát";
 inline constexpr std::array<std::string_view, 9> kScales = {
     "200", "500", "1000", "2000", "5000", "10000", "25000", "50000", "100000"};
-// The kind list; the spaces line the patterns up in the font of the list.
-inline constexpr std::array<std::string_view, 10> kKinds = {
-    "Số liệu sổ đo                    [*.asc]", "Số liệu FieldBook SDR     [*.sdr]",
-    "Số liệu FieldBook Sokki   [*.obs]",        "Số liệu máy SET               [*.set]",
-    "Số liệu máy Geodimet      [*.raw]",        "Số liệu máy Topcom         [*.idx]",
-    "Số liệu máy Topcom 226  [*.tcm]",          "Số liệu máy LEICA Wid     [*.gre]",
-    "Số liệu máy NIKON           [*.dn7]",      "Số liệu khác                      [*.*]"};
 inline constexpr std::string_view kFileNotFoundShort = "Không tìm thấy File ";
 inline constexpr std::string_view kDataOfFile = "Số liệu của File: ";
 inline constexpr std::string_view kExitQuestion = "Bạn có muốn thoát khỏi chương trình không ?";

@@ -2,17 +2,11 @@
 
 #include <gtest/gtest.h>
 
-#include <cctype>
 #include <string>
 #include <vector>
 
 namespace kavu {
 namespace {
-
-std::string Lower(std::string text) {
-  for (char& c : text) c = static_cast<char>(std::tolower(static_cast<unsigned char>(c)));
-  return text;
-}
 
 // The names of a path, native on each system: on Windows with drive letters
 // and backslashes (the system's absolute path gives the TRIDO folder).
@@ -47,18 +41,6 @@ TEST(DeriveFileSelection, ProductsAreNamedAfterTheFileNameOnly) {
               (Names{c.path, c.tentm, c.daufile, c.duoifile, c.tentmbd, c.filesl1}));
   }
   EXPECT_EQ(KindOfExtension(""), 9);
-}
-
-TEST(KindOfExtension, UpperCaseExtensionsSelectTheirKindAndPattern) {
-  const char* extensions[] = {"ASC", "SDR", "OBS", "SET", "RAW", "IDX", "TCM", "GRE", "DN7"};
-  for (int k = 0; k < 9; ++k) {
-    EXPECT_EQ(KindOfExtension(extensions[k]), k);
-    EXPECT_EQ(PatternOfKind(k), "*." + Lower(extensions[k]));
-  }
-  EXPECT_EQ(KindOfExtension("sdr"), 9);
-  EXPECT_EQ(KindOfExtension("TXT"), 9);
-  EXPECT_EQ(PatternOfKind(9), "*.*");
-  EXPECT_EQ(PatternOfKind(42), "*.*");
 }
 
 }  // namespace
