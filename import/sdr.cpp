@@ -170,6 +170,10 @@ class SdrWriter {
     }
 
     if (have_backsight_ && id == backsight_id_) {
+      // The shot on the backsight carries its name after the prism height,
+      // as the narrow layout's description does: the run then reads it as
+      // the orientation distance to check, not as a point to compute.
+      if (wide_) obs.description = backsight_name_;
       reference_ = obs.shot.reading;
       if (!oriented_) {
         const std::string note = Trim(layout_.note.Of(line));
@@ -210,8 +214,9 @@ class SdrWriter {
     std::string record =
         LString(obs.name, wide_ ? 10 : 4) + GocSt(TurnReading(shot.reading, reference_)) +
         DistanceText(shot.distance) + GocSt(shot.zenith) + PrismHeightText(obs.prism_height);
-    // The 4-column book carries a description; the 16-column one none.
-    if (!wide_) record += " " + obs.description;
+    // The 4-column book carries a description; the 16-column one none but
+    // the backsight's name on the shots of the backsight.
+    if (!wide_ || !obs.description.empty()) record += " " + obs.description;
     AppendLine(out_, record);
   }
 
