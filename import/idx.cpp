@@ -2,14 +2,16 @@
 // height, then SLOPE observation lines "no, "name", cfg, Hz, Vz, SDist, RefHt,
 // ..." closed by END SLOPE. Angles are decimal degrees unless the file's
 // UNITS declare "ANGULAR DMS" (D.MMSSss) or "ANGULAR GON", lengths metres
-// unless "LINEAR FEET"; distances are slope distances, reduced to horizontal
-// here, and readings are turned so that the orientation shot reads 0.
-#include <algorithm>
+// unless "LINEAR FEET" (or FT, FOOT); distances are slope distances, reduced
+// to horizontal here, and readings are turned so that the orientation shot
+// reads 0.
 #include <array>
 #include <cmath>
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "core/angles.h"
@@ -193,7 +195,7 @@ bool Declare(const Words& words, Declarations& declared) {
   } else if (words.word[0] == "LINEAR") {
     if (unit == "METRE" || unit == "METER") {
       declared.units.metres_per_unit = 1;
-    } else if (unit == "FEET" || unit == "FOOT") {
+    } else if (unit == "FEET" || unit == "FOOT" || unit == "FT") {
       declared.units.metres_per_unit = 0.3048;
     } else {
       return false;
