@@ -2,14 +2,16 @@
 // height, then SLOPE observation lines "no, "name", cfg, Hz, Vz, SDist, RefHt,
 // ..." closed by END SLOPE. Angles are decimal degrees unless the file's
 // UNITS declare "ANGULAR DMS" (D.MMSSss) or "ANGULAR GON", lengths metres
-// unless "LINEAR FEET"; distances are slope distances, reduced to horizontal
-// here, and readings are turned so that the orientation shot reads 0.
-#include <algorithm>
+// unless "LINEAR FEET" (or FT, FOOT); distances are slope distances, reduced
+// to horizontal here, and readings are turned so that the orientation shot
+// reads 0.
 #include <array>
 #include <cmath>
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <string_view>
+#include <utility>
 #include <vector>
 
 #include "core/angles.h"
@@ -94,6 +96,8 @@ struct Pointing {
   std::string name;
   double reading = 0, zenith = 0, slope = 0, prism = 0;
   bool face2 = false;
+  // The horizontal distance of the one face of a pair that has a distance.
+  std::optional<double> horizontal;
 };
 
 struct Declarations {
@@ -135,13 +139,22 @@ Pointing MeanOfFaces(const Pointing& a, const Pointing& b) {
   if (gap < -180) gap += 360;
   mean.reading = std::fmod(a.reading + gap / 2 + 360, 360.0);
   mean.zenith = (a.zenith + b.zenith) / 2;
-  // A face without a distance does not halve the other's.
-  mean.slope = a.slope > 0 && b.slope > 0 ? (a.slope + b.slope) / 2 : std::max(a.slope, b.slope);
+  // Distances count by their size, as a lone shot's do. A face without a
+  // distance does not halve the other's: the pair then has the distance of
+  // the face that has one, as that face alone gives it.
+  if (a.slope != 0 && b.slope != 0) {
+    mean.slope = (std::fabs(a.slope) + std::fabs(b.slope)) / 2;
+  } else if (a.slope != 0 || b.slope != 0) {
+    const Pointing& measured = a.slope != 0 ? a : b;
+    mean.slope = std::fabs(measured.slope);
+    mean.horizontal = std::fabs(HorizontalDistance(measured.slope, measured.zenith));
+  }
   return mean;
 }
 
 std::string DetailRecord(const Pointing& shot, double reference) {
-  const double horizontal = std::fabs(HorizontalDistance(shot.slope, shot.zenith));
+  const double horizontal =
+      shot.horizontal.value_or(std::fabs(HorizontalDistance(shot.slope, shot.zenith)));
   // The name is padded to 5 columns but never cut: 8-digit point numbers are
   // common and cutting them would merge different points.
   return LString(shot.name, 5) + GocSt(TurnReading(shot.reading, reference)) +
@@ -182,7 +195,7 @@ bool Declare(const Words& words, Declarations& declared) {
   } else if (words.word[0] == "LINEAR") {
     if (unit == "METRE" || unit == "METER") {
       declared.units.metres_per_unit = 1;
-    } else if (unit == "FEET" || unit == "FOOT") {
+    } else if (unit == "FEET" || unit == "FOOT" || unit == "FT") {
       declared.units.metres_per_unit = 0.3048;
     } else {
       return false;

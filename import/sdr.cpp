@@ -24,25 +24,30 @@ namespace {
 // The names of the points: one per identifier through the whole recording.
 // In the wide layout a point is named by its identifier. In the narrow one a
 // point with coordinates is named by the first description of 3 characters
-// or more that its coordinate records give it, else "DKC" + its identifier.
+// or more that its "08" records give it, else "DKC" + its identifier. A
+// set-up's own description names its point only when no "08" record lists
+// it: the set-up's description says what the station is, and it may well be
+// the name of another point.
 class Names {
  public:
   Names(const std::vector<std::string>& lines, const SdrLayout& layout)
       : wide_(layout.width == 16) {
     if (wide_) return;
+    std::unordered_map<std::string, std::string> set_ups;
     for (const std::string& line : lines) {
       const std::string_view code = RecordCode(line);
       if (!IsCoordinateCode(code)) continue;
-      const std::string_view description =
-          IsSetUpCode(code) ? layout.description.Of(line) : ColumnsFrom(line, 49);
       if (TrimView(layout.x.Of(line)).empty() || TrimView(layout.y.Of(line)).empty()) continue;
-      const std::string id = Identifier(line, layout.id);
-      auto [it, fresh] = labels_.try_emplace(id);
+      const bool set_up = IsSetUpCode(code);
+      const std::string_view description =
+          set_up ? layout.description.Of(line) : ColumnsFrom(line, 49);
+      auto [it, fresh] = (set_up ? set_ups : labels_).try_emplace(Identifier(line, layout.id));
       if (fresh || it->second.empty()) {
         const std::string_view text = TrimView(description);
         it->second = text.size() < 3 ? std::string() : Trim(FixedWidth(text, 12));
       }
     }
+    labels_.merge(set_ups);  // keeps the name an "08" record gives
     for (auto& [id, label] : labels_) {
       label = BlankFreeName(label.empty() ? "DKC" + id : label);
     }
@@ -165,6 +170,10 @@ class SdrWriter {
     }
 
     if (have_backsight_ && id == backsight_id_) {
+      // The shot on the backsight carries its name after the prism height,
+      // as the narrow layout's description does: the run then reads it as
+      // the orientation distance to check, not as a point to compute.
+      if (wide_) obs.description = backsight_name_;
       reference_ = obs.shot.reading;
       if (!oriented_) {
         const std::string note = Trim(layout_.note.Of(line));
@@ -205,8 +214,9 @@ class SdrWriter {
     std::string record =
         LString(obs.name, wide_ ? 10 : 4) + GocSt(TurnReading(shot.reading, reference_)) +
         DistanceText(shot.distance) + GocSt(shot.zenith) + PrismHeightText(obs.prism_height);
-    // The 4-column book carries a description; the 16-column one none.
-    if (!wide_) record += " " + obs.description;
+    // The 4-column book carries a description; the 16-column one none but
+    // the backsight's name on the shots of the backsight.
+    if (!wide_ || !obs.description.empty()) record += " " + obs.description;
     AppendLine(out_, record);
   }
 

@@ -101,7 +101,7 @@ Shot ReadShot(std::string_view record, const SdrLayout& layout, const Units& uni
 }
 
 std::string BlankFreeName(std::string_view name) {
-  std::string out(name);
+  std::string out = Trim(name);
   for (char& c : out) {
     if (c == ' ') c = '_';
   }

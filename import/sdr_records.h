@@ -90,8 +90,10 @@ struct Shot {
 };
 Shot ReadShot(std::string_view record, const SdrLayout& layout, const Units& units);
 
-// A name as a converter writes it: every blank inside becomes "_", so that
-// the field book's splitter keeps it one field.
+// A name as a converter writes it: the blanks around it dropped (an
+// identifier padded to its columns names the same point as the number the
+// detail record gives it) and every blank inside turned into "_", so that the
+// field book's splitter keeps it one field.
 std::string BlankFreeName(std::string_view name);
 
 }  // namespace kavu

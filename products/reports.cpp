@@ -1,6 +1,7 @@
 #include "products/reports.h"
 
 #include <algorithm>
+#include <array>
 #include <filesystem>
 #include <optional>
 #include <string>
@@ -110,17 +111,22 @@ std::string ControlListingLine(const Survey& survey, const ControlListing& entry
 }
 
 void AppendCoordinateListingLine(std::string& out, const Survey& survey, const ComputedPoint& p) {
-  const Survey::PointTexts texts = survey.Texts(p);
+  // The detail record's fields: name, reading, distance, zenith, prism
+  // height, then its words.
+  std::array<std::string_view, 7> f;
+  const std::size_t fields = RecordFields(survey.Text(p.record, std::string_view::npos), f);
   const std::size_t from = out.size();
-  out.append(texts.name);
+  out.append(f[0].substr(0, 12));
   PadBehind(out, from, 5);
   AppendColumn(out, p.x, kNorthingMask, 12);
   AppendColumn(out, p.y, kEastingMask, 12);
   AppendColumn(out, p.z, kHeightMask, 12);
-  AppendColumn(out, Val(texts.prism), kPrismMask, 10);
-  for (const std::string_view words : {texts.code, texts.note}) {
-    if (!words.empty()) out.append(" ").append(words);
-  }
+  AppendColumn(out, Val(f[4]), kPrismMask, 10);
+  if (!p.words) return;
+  // Each word keeps its blank, an empty one too: a record whose line ended in
+  // a tab has an empty last field.
+  out.append(" ").append(f[5]);
+  if (fields == 7) out.append(" ").append(f[6]);
 }
 
 void WriteControlListing(TextOut& out, const Survey& survey) {

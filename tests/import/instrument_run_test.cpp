@@ -40,8 +40,9 @@ TEST_F(InstrumentRun, ExampleJobsComputeToTheirShots) {
       // 101 is shot before the backsight KC02 (read at 349.315051): turned.
       {"job-sdr.sdr", false, 6, "101",
        Shot(kKc01, kKc02, 349.315051, 15.880102, 50.0025, 89.427061)},
-      // The backsight shots KC02 and KC01 are points too; 105 from KC03 on KC01.
-      {"job-obs.obs", false, 8, "105",
+      // The backsight shots KC02 and KC01 check the orientation distances,
+      // no points; 105 from KC03 on KC01.
+      {"job-obs.obs", false, 6, "105",
        Shot(kKc03, kKc01, 351.11986495, 95.36989765, 50.00022500, 89.82811318)},
       // 103 twice, the second from KC02 on KC01, read at 194.56505118.
       {"job-set.set", false, 8, "103",
@@ -86,6 +87,9 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
     std::vector<Point> known;      // coordinate records as the field book must hold them
     std::vector<Point> shot = {};  // computed points and the file's coordinates of them
     std::vector<const char*> reported = {}, never_reported = {};
+    // Lines the converted field book holds (trimmed), and names the
+    // coordinate text file must not list.
+    std::vector<const char*> book = {}, not_computed = {};
   };
   const Case cases[] = {
       {"barnes-example.sdr",
@@ -102,11 +106,30 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
        {{"1011", -4.347, -6.794}, {"1012", -0.172, -6.773}},
        {},
        {"KHAC TOA DO", "khong co toa do"}},
+      // The angle-only shot on the backsight KRYSHA is its orientation
+      // distance record (nothing to check), no point without distance.
       {"geoeasy-20151125.obs",
        {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
        {},
        {},
-       {"KHAC TOA DO", "khong co toa do"}},
+       {"KHAC TOA DO", "khong co toa do", "khong co khoang cach"},
+       {"KRYSHA        00000    0.000   801608 0.00000000 KRYSHA"},
+       {"KRYSHA"}},
+      {"geoeasy-sdr33-20151204.sdr",
+       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
+       {},
+       {},
+       {"KHAC TOA DO", "khong co toa do", "khong co khoang cach"},
+       {"KRYSHA        00000    0.000   801709 0.00000000 KRYSHA"},
+       {"KRYSHA"}},
+      // The backsight OR has no coordinates: the set-up is reported. Its
+      // shot carries its name as the other shots on a backsight do.
+      {"tops-pr-sokkia_sdr33_polar.sdr",
+       {{"STZTEMP", 0, 0}, {"1", 19.914, 9.217}, {"33", 10.289, 11.174}},
+       {},
+       {"Diem: OR           khong co toa do"},
+       {},
+       {"OR            00000    0.000   851345  1.530 OR"}},
       {"geoeasy-20151130.set",
        {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
        {},
@@ -127,8 +150,13 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
       if (f.size() >= 4 && f[0] == "TR") known.emplace(f[1], Xy{Val(f[2]), Val(f[3])});
     }
     for (const Point& p : c.known) ExpectNear(known, p.name, {p.x, p.y}, 1e-6);
+    const std::string book = FileBytes(dir_ / (stem + ".asc"));
+    for (const char* line : c.book) {
+      EXPECT_NE(book.find(std::string("\n") + line + "\r\n"), std::string::npos) << line;
+    }
     const auto points = Coordinates(stem + ".txt");
     for (const Point& p : c.shot) ExpectNear(points, p.name, {p.x, p.y}, 0.005);
+    for (const char* name : c.not_computed) EXPECT_FALSE(points.contains(name)) << name;
     const std::string report = FileBytes(dir_ / (stem + ".err"));
     for (const char* line : c.reported) {
       EXPECT_NE(report.find(std::string("\r\n") + line + "\r\n"), std::string::npos) << line;
