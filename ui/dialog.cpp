@@ -25,7 +25,11 @@ Window::Window(QWidget* parent) : QDialog(parent) {
 
 void Window::keyPressEvent(QKeyEvent* event) {
   if (event->key() == Qt::Key_Escape && event->modifiers() == Qt::NoModifier) {
-    if (cancel_ != nullptr && cancel_->isEnabled()) cancel_->click();
+    if (cancel_ == nullptr) {
+      close();
+    } else if (cancel_->isEnabled()) {
+      cancel_->click();
+    }
     event->accept();
     return;
   }

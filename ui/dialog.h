@@ -1,11 +1,13 @@
 // A window of the program: Enter presses its default button, Esc its cancel
-// button; closing it runs its own closing steps.
+// button, or closes it when it has none; closing it runs its own closing
+// steps.
 #pragma once
 
 #include <QDialog>
 #include <QString>
 #include <QStringList>
 
+class QDateTime;
 class QFileDialog;
 class QPushButton;
 
