@@ -24,6 +24,8 @@ inline constexpr std::string_view kAllFiles = "Mọi File (*)";
 inline constexpr std::string_view kErrFiles = "File báo lỗi (*.err)";
 inline constexpr std::string_view kOpenFolder = "Mở thư mục";
 inline constexpr std::array<std::string_view, 4> kFileColumns = {"Tên", "Cỡ", "Kiểu", "Ngày sửa"};
+// A file's size in the file list: bytes below 1 KB, then steps of 1024.
+inline constexpr std::array<std::string_view, 5> kSizeUnits = {"byte", "KB", "MB", "GB", "TB"};
 
 // Main window.
 inline constexpr std::string_view kMainCaption = "Xử lý số liệu đo toạ độ, độ cao chi tiết";
