@@ -73,8 +73,10 @@ run_one() {  # build, input, folder
   "$1/cli/kavu-cli" --all --seed 7 "$3/job/$(basename "$2")" >"$3/stdout" 2>"$3/stderr" ||
     status=$?
   echo "$status" >"$3/status"
-  # The start and end times are the only texts that depend on the clock.
+  # The start and end times are the only texts that depend on the clock; the
+  # paths name the build's own folder.
   sed -i -E 's/[0-9]{2}:[0-9]{2}:[0-9]{2}/HH:MM:SS/' "$3/stdout"
+  sed -i "s|$3/|FOLDER/|g" "$3/stdout" "$3/stderr"
 }
 
 # Both builds compute one input; a difference is written beside the results.

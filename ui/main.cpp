@@ -76,7 +76,7 @@ int ComputeAlone(kavu::ui::MainWindow& window, const QString& file, const QStrin
 int main(int argc, char** argv) {
   QApplication app(argc, argv);
   QApplication::setApplicationName(Q(kavu::ui::kAppTitle));
-  kavu::ui::InstallTranslation(
+  kavu::ui::UseVietnamese(
       QFileInfo(kavu::ui::ProgramDataFile(QStringLiteral("kavu_vi.qm"))).path());
   QCommandLineParser parser;
   parser.addHelpOption();

@@ -32,6 +32,8 @@ inline constexpr std::string_view kCancelKeyed = "&Hủy";
 inline constexpr std::string_view kOpenFolderKeyed = "&Mở thư mục";
 inline constexpr std::string_view kViewReportKeyed = "&Xem File lỗi";
 inline constexpr std::array<std::string_view, 4> kFileColumns = {"Tên", "Cỡ", "Kiểu", "Ngày sửa"};
+// A file's size in the file list: bytes below 1 KB, then steps of 1024.
+inline constexpr std::array<std::string_view, 5> kSizeUnits = {"byte", "KB", "MB", "GB", "TB"};
 
 // Main window.
 inline constexpr std::string_view kMainCaption = "Xử lý số liệu đo toạ độ, độ cao chi tiết";
