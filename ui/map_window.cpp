@@ -46,6 +46,8 @@ constexpr double kPanStep = 0.125;
 constexpr QSize kDefaultSize{1000, 760};
 // Room left on the screen for the window's frame and title bar.
 constexpr QSize kFrameAllowance{16, 48};
+// The lines the information pane shows when the window opens.
+constexpr int kPaneLines = 7;
 // Two items less than this apart, metres, are one point.
 constexpr double kSamePlace = 0.0005;
 
@@ -86,7 +88,10 @@ class SaveDialog : public QFileDialog {
   }
 
   void accept() override {
-    if (QLineEdit* edit = nameEdit(); edit != nullptr && !edit->text().trimmed().isEmpty()) {
+    // A folder's name typed opens the folder.
+    QLineEdit* edit = nameEdit();
+    if (edit != nullptr && !edit->text().trimmed().isEmpty() &&
+        !QFileInfo(directory().filePath(edit->text())).isDir()) {
       edit->setText(WithExtension(edit->text(), selectedNameFilter(), filters_));
     }
     QFileDialog::accept();
@@ -329,7 +334,7 @@ MapWindow::MapWindow(QWidget* parent) : QMainWindow(parent) {
 
   // Every action in a menu, where its access key and keys show, and the
   // everyday ones on the tool bar too.
-  QMenu* file = menuBar()->addMenu(Q(kMapMenu));
+  QMenu* file = menuBar()->addMenu(Q(kFileMenu));
   QMenu* view = menuBar()->addMenu(Q(kViewMenu));
   QToolBar* tools = addToolBar(Q(kMapButton));
   tools->setObjectName(QStringLiteral("congcu"));
@@ -357,8 +362,8 @@ MapWindow::MapWindow(QWidget* parent) : QMainWindow(parent) {
       action(file, "saveView", kSaveView, kSaveViewTip, {}, [this] { askPicture(false); });
   QAction* saveWhole =
       action(file, "saveWhole", kSaveWhole, kSaveWholeTip, {}, [this] { askPicture(true); });
-  saveSketch_ = action(file, "saveSketch", kSaveSketch, kSaveSketchTip, {QKeySequence::Save},
-                       [this] { askSketch(); });
+  saveSketch_ =
+      action(file, "saveSketch", kSaveSketch, kSaveSketchTip, {}, [this] { askSketch(); });
   printSketch_ = action(file, "printSketch", kPrintSketch, kPrintSketchTip, {QKeySequence::Print},
                         [this] { printSketch(); });
   file->addSeparator();
@@ -394,7 +399,18 @@ void MapWindow::setSurvey(Survey survey, std::string fieldBook, std::string sket
 
 void MapWindow::showEvent(QShowEvent* event) {
   QMainWindow::showEvent(event);
-  if (!event->spontaneous()) placeOnScreen();
+  if (event->spontaneous()) return;
+  const bool first = !placed_;
+  placeOnScreen();
+  if (first) {
+    // Room for what a point usually shows: its line, a report line or two and
+    // its records; the drawing takes the rest.
+    const QList<int> sizes = split_->sizes();
+    const int total = sizes.value(0) + sizes.value(1);
+    const int pane =
+        details_->fontMetrics().lineSpacing() * kPaneLines + 2 * details_->frameWidth();
+    if (total > 2 * pane) split_->setSizes({total - pane, pane});
+  }
   canvas_->setFocus();
 }
 

@@ -109,7 +109,7 @@ inline constexpr std::string_view kNotFoundAgain = "Không tìm thấy! Có tìm
 // The map window. An "&" marks the access key of a menu entry; the captions of
 // the save dialogs and of the print preview leave it out.
 inline constexpr std::string_view kMapTitle = "Bản đồ: ";
-inline constexpr std::string_view kMapMenu = "&File";
+inline constexpr std::string_view kFileMenu = "&File";
 inline constexpr std::string_view kViewMenu = "&Xem";
 inline constexpr std::string_view kZoomIn = "Phóng &to";
 inline constexpr std::string_view kZoomOut = "Thu &nhỏ";
