@@ -13,6 +13,8 @@
 #include <string>
 
 #include "core/tcvn3.h"
+#include "core/text.h"
+#include "ui/texts.h"
 
 namespace kavu::ui {
 namespace {
@@ -22,21 +24,6 @@ const QColor kControl(0, 60, 200);
 const QColor kStation(0, 120, 40);
 const QColor kPeg(150, 0, 150);
 const QColor kSight(150, 150, 150);
-
-QColor ColourOf(const MapItem& item) {
-  if (item.flagged) return kFlagged;
-  switch (item.kind) {
-    case MapKind::Control:
-      return kControl;
-    case MapKind::Station:
-      return kStation;
-    case MapKind::Peg:
-      return kPeg;
-    case MapKind::Detail:
-      break;
-  }
-  return Qt::black;
-}
 
 QFont LabelFont(int pixels, bool bold = false) {
   QFont font(QStringLiteral("DejaVu Sans"));
@@ -90,12 +77,37 @@ void PaintLabel(QPainter& painter, QPointF at, const QString& text, const QColor
 
 }  // namespace
 
+QColor ColourOf(const MapItem& item) {
+  if (item.flagged) return kFlagged;
+  switch (item.kind) {
+    case MapKind::Control:
+      return kControl;
+    case MapKind::Station:
+      return kStation;
+    case MapKind::Peg:
+      return kPeg;
+    case MapKind::Detail:
+      break;
+  }
+  return Qt::black;
+}
+
 QString FromTcvn3(std::string_view text) { return QString::fromStdString(Tcvn3ToUtf8(text)); }
 
 MapModel BuildMap(const Survey& survey) {
   std::set<std::string, std::less<>> named;
   for (const ReportEntry& entry : survey.report) {
     if (entry.size > 0) named.emplace(survey.Point(entry));
+  }
+  // A peg set out in this run that a later station occupies or sights is a
+  // known point of the run, but it stays a peg on the map; a known point that
+  // the run read keeps its name first, whatever peg shares it.
+  std::set<std::string_view, std::less<>> read, pegs;
+  for (std::size_t i = 0; i < survey.knownRead && i < survey.known.size(); ++i) {
+    read.insert(TrimView(survey.known[i][0]));
+  }
+  for (const ComputedPoint& p : survey.points) {
+    if (p.kind() == PointKind::Peg) pegs.insert(survey.Name(p));
   }
   MapModel model;
   auto add = [&](MapKind kind, std::string_view name, double x, double y, std::size_t index,
@@ -105,6 +117,7 @@ MapModel BuildMap(const Survey& survey) {
   };
   for (std::size_t i = 0; i < survey.control.size(); ++i) {
     const SurveyPoint& p = survey.control[i];
+    if (pegs.contains(p.name) && !read.contains(p.name)) continue;
     add(MapKind::Control, p.name, p.x, p.y, i, 0);
   }
   for (std::size_t i = 0; i < survey.stations.size(); ++i) {
@@ -175,9 +188,12 @@ void PaintMap(QPainter& painter, const MapModel& model, const MapView& view) {
   }
 
   const bool labels = view.scale >= kLabelScale;
-  std::set<QString> controlNames;
+  // One name a point: a control point's, else its station's, which is shown
+  // at every scale.
+  std::set<QString> controlNames, stationNames;
   for (const MapItem& item : model.items) {
     if (item.kind == MapKind::Control) controlNames.insert(item.name);
+    if (item.kind == MapKind::Station) stationNames.insert(item.name);
   }
   // Detail points first, so that the control points stay on top.
   QList<QPointF> dots;
@@ -212,7 +228,8 @@ void PaintMap(QPainter& painter, const MapModel& model, const MapView& view) {
         case MapKind::Peg:
           painter.setPen(QPen(colour, 1.5));
           painter.drawRect(QRectF(at - QPointF(3.5, 3.5), QSizeF(7, 7)));
-          if ((labels || item.flagged) && !controlNames.contains(item.name)) {
+          if ((labels || item.flagged) && !controlNames.contains(item.name) &&
+              !stationNames.contains(item.name)) {
             PaintLabel(painter, at, item.name, colour);
           }
           break;
@@ -239,16 +256,40 @@ void PaintMap(QPainter& painter, const MapModel& model, const MapView& view) {
   painter.restore();
 }
 
+int KindRank(MapKind kind) {
+  switch (kind) {
+    case MapKind::Control:
+      return 0;
+    case MapKind::Peg:
+      return 1;
+    case MapKind::Detail:
+      return 2;
+    case MapKind::Station:
+      break;
+  }
+  return 3;
+}
+
+QString KindName(MapKind kind) {
+  const std::string_view name = kPointKinds[static_cast<std::size_t>(kind)];
+  return QString::fromUtf8(name.data(), static_cast<qsizetype>(name.size()));
+}
+
 std::optional<std::size_t> ItemAt(const MapModel& model, const MapView& view, QPointF device,
                                   double radius) {
+  // Points closer than this on the screen are at one place.
+  constexpr double kSamePlace = 0.25;  // pixels, squared
   std::optional<std::size_t> nearest;
   double best = radius * radius;
   for (std::size_t i = 0; i < model.items.size(); ++i) {
-    const QPointF d = view.toDevice(model.items[i].x, model.items[i].y) - device;
+    const MapItem& item = model.items[i];
+    const QPointF d = view.toDevice(item.x, item.y) - device;
     const double distance = d.x() * d.x() + d.y() * d.y();
-    // At the same place the first item wins: a control point over its station.
-    if (distance < best) {
-      best = distance;
+    // At one place the point itself wins over the station set up on it: a
+    // control point or a peg over its station.
+    const bool tie = nearest && std::abs(distance - best) < kSamePlace;
+    if (tie ? KindRank(item.kind) < KindRank(model.items[*nearest].kind) : distance < best) {
+      best = std::min(best, distance);
       nearest = i;
     }
   }

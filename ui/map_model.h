@@ -3,6 +3,7 @@
 // right, at the same scale both ways.
 #pragma once
 
+#include <QColor>
 #include <QPointF>
 #include <QSize>
 #include <QString>
@@ -67,6 +68,14 @@ MapView FitView(const MapModel& model, QSize size);
 MapView ZoomAt(const MapView& view, QPointF device, double factor);
 
 void PaintMap(QPainter& painter, const MapModel& model, const MapView& view);
+
+// The colour an item is drawn in: red when flagged, else by its kind.
+QColor ColourOf(const MapItem& item);
+// What a point is, for the legend, the tooltips and the information pane.
+QString KindName(MapKind kind);
+// Which of the items at one place stands for it: a control point, a peg, a
+// detail point, then a station.
+int KindRank(MapKind kind);
 
 // The item nearest to a device point within radius pixels.
 std::optional<std::size_t> ItemAt(const MapModel& model, const MapView& view, QPointF device,

@@ -5,6 +5,8 @@
 
 #include <QMainWindow>
 #include <QPoint>
+#include <QRect>
+#include <QStringList>
 #include <QWidget>
 #include <functional>
 #include <optional>
@@ -17,6 +19,7 @@
 
 class QAction;
 class QLabel;
+class QSplitter;
 class QTextBrowser;
 
 namespace kavu::ui {
@@ -25,7 +28,8 @@ namespace kavu::ui {
 inline constexpr std::string_view kMapButton = "Bản đồ";
 inline constexpr std::string_view kOpenMapAfterRun = "Mở bản đồ sau khi tính";
 
-// The drawing: wheel zoom around the cursor, drag to pan, click to pick.
+// The drawing: wheel zoom around the cursor, drag or the arrow keys to pan,
+// click to pick; a point's name and kind under the cursor as its tooltip.
 class MapCanvas : public QWidget {
   Q_OBJECT
  public:
@@ -36,15 +40,22 @@ class MapCanvas : public QWidget {
   // The whole survey in the window.
   void fit();
   void zoomAt(QPointF device, double factor);
+  // Zoomed around the middle of the drawing.
+  void zoom(double factor);
+  // The view moved by pixels on the screen: positive x shows more of the
+  // east, positive y more of the south.
+  void pan(QPointF pixels);
 
  signals:
   void cursorMoved(QPointF ground);  // x north, y east
   void itemClicked(std::size_t item);
 
  protected:
+  bool event(QEvent* event) override;
   void paintEvent(QPaintEvent* event) override;
   void resizeEvent(QResizeEvent* event) override;
   void wheelEvent(QWheelEvent* event) override;
+  void keyPressEvent(QKeyEvent* event) override;
   void mousePressEvent(QMouseEvent* event) override;
   void mouseMoveEvent(QMouseEvent* event) override;
   void mouseReleaseEvent(QMouseEvent* event) override;
@@ -57,9 +68,41 @@ class MapCanvas : public QWidget {
   bool dragged_ = false;
 };
 
+// What a save dialog is asked for.
+struct SaveRequest {
+  QString caption;
+  QString proposed;  // the path proposed, with the extension of `filter`
+  QStringList filters;
+  QString filter;  // the one chosen when the dialog opens
+};
+
+// What the user chose; an empty path when cancelled.
+struct SaveChoice {
+  QString path;
+  QString filter;
+};
+
+// The extension of a filter such as "Hình PNG (*.png)", without its dot.
+QString FilterExtension(const QString& filter);
+// The job's name: the field book's path up to the first "." of its file name,
+// in its folder, followed by "." and extension; empty without a field book.
+QString ProposedPath(const QString& fieldBook, const QString& extension);
+// The path with the extension of filter added, unless it already ends with
+// the extension of one of filters.
+QString WithExtension(const QString& path, const QString& filter, const QStringList& filters);
+// Qt's own save dialog with the program's labels, proposing request.proposed
+// and keeping its extension in step with the filter chosen.
+SaveChoice ChooseSavePath(QWidget* parent, const SaveRequest& request);
+
+// Where a window goes on a screen: the frame wanted, made smaller to fit the
+// screen's available area (never below minimum) and moved into it.
+QRect PlaceWithin(const QRect& frame, QSize minimum, const QRect& available);
+
 class MapWindow : public QMainWindow {
   Q_OBJECT
  public:
+  using SaveChooser = std::function<SaveChoice(QWidget*, const SaveRequest&)>;
+
   explicit MapWindow(QWidget* parent = nullptr);
 
   // The run to show: its survey, the field book its records come from and its
@@ -76,16 +119,21 @@ class MapWindow : public QMainWindow {
   bool savePicture(const QString& path, bool whole) const;
   bool saveSketch(const QString& path) const;
   void printSketch();
-  // Asks for the path to save to (caption, filters); empty when cancelled.
-  void setSaveChooser(std::function<QString(const QString&, const QString&)> chooser) {
-    chooseSave_ = std::move(chooser);
-  }
+  // Asks for the path to save to; Qt's dialog unless a test stands in.
+  void setSaveChooser(SaveChooser chooser) { chooseSave_ = std::move(chooser); }
+
+ protected:
+  void showEvent(QShowEvent* event) override;
 
  private:
   void pick(std::size_t item);
   void askPicture(bool whole);
   void askSketch();
+  // Asks for a path; the filter chosen in `filter`, empty when cancelled.
+  QString askPath(std::string_view caption, const QStringList& filters, QString& filter);
   void cannotWrite(const QString& path);
+  void showDetails(const QString& text);
+  void placeOnScreen();
   std::string nameOf(const MapItem& item) const;
   std::string bookLine(std::size_t line);
 
@@ -93,11 +141,14 @@ class MapWindow : public QMainWindow {
   std::string fieldBook_, sketch_;
   std::optional<std::vector<std::string>> bookLines_;
   MapCanvas* canvas_ = nullptr;
+  QSplitter* split_ = nullptr;
   QTextBrowser* details_ = nullptr;
   QLabel* cursor_ = nullptr;
   QAction* saveSketch_ = nullptr;
   QAction* printSketch_ = nullptr;
-  std::function<QString(const QString&, const QString&)> chooseSave_;
+  QString pictureFilter_;  // the picture kind chosen last
+  bool placed_ = false;
+  SaveChooser chooseSave_ = ChooseSavePath;
 };
 
 }  // namespace kavu::ui

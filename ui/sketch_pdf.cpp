@@ -15,15 +15,20 @@
 
 #include "core/lines.h"
 #include "core/tcvn3.h"
+#include "ui/texts.h"
 
 namespace kavu::ui {
 namespace {
 
-// Each station's section of the file begins with this line.
-const QString kSectionStart = QStringLiteral("Lược đồ số:");
+QString Text(std::string_view text) {
+  return QString::fromUtf8(text.data(), static_cast<qsizetype>(text.size()));
+}
+
 // The largest size of the sketch's letters; smaller when a line is too wide.
 constexpr double kPointSize = 10;
 constexpr double kMarginMm = 15;
+// The lines of a page kept for its number: an empty one and the number.
+constexpr int kFootLines = 2;
 
 // The column heads of a section: the rule above them, their two lines and the
 // rule below them; empty when the section has none.
@@ -36,6 +41,19 @@ QStringList ColumnHeads(const QStringList& section) {
   return {};
 }
 
+// The station a section is about, as its header names it; empty when none.
+QString StationName(const QStringList& section) {
+  const QString label = Text(kSketchStation);
+  for (const QString& line : section) {
+    if (!line.startsWith(label)) continue;
+    QString name = line.mid(label.size());
+    const qsizetype area = name.indexOf(Text(kSketchArea));
+    if (area >= 0) name.truncate(area);
+    return name.trimmed();
+  }
+  return {};
+}
+
 }  // namespace
 
 std::vector<QStringList> SketchPages(const QString& sketch, int linesPerPage) {
@@ -43,8 +61,9 @@ std::vector<QStringList> SketchPages(const QString& sketch, int linesPerPage) {
   while (!lines.isEmpty() && lines.back().isEmpty()) lines.removeLast();
 
   std::vector<QStringList> sections;
+  const QString sectionStart = Text(kSketchSection);
   for (const QString& line : lines) {
-    if (sections.empty() || line.startsWith(kSectionStart)) sections.emplace_back();
+    if (sections.empty() || line.startsWith(sectionStart)) sections.emplace_back();
     sections.back().append(line);
   }
 
@@ -54,13 +73,16 @@ std::vector<QStringList> SketchPages(const QString& sketch, int linesPerPage) {
     while (!section.isEmpty() && section.front().isEmpty()) section.removeFirst();
     while (!section.isEmpty() && section.back().isEmpty()) section.removeLast();
     if (section.isEmpty()) continue;
-    const QStringList heads = ColumnHeads(section);
-    const int room = std::max(linesPerPage, static_cast<int>(heads.size()) + 1);
+    // A page that goes on with a station names it and repeats the heads.
+    QStringList goesOn = ColumnHeads(section);
+    const QString station = StationName(section);
+    goesOn.prepend(Text(kSketchStation) + QLatin1Char(' ') + station + Text(kContinued));
+    const int room = std::max(linesPerPage, static_cast<int>(goesOn.size()) + 1);
     qsizetype next = 0;
     pages.emplace_back();
     while (next < section.size()) {
       if (pages.back().size() >= room) {
-        pages.emplace_back(heads);
+        pages.emplace_back(goesOn);
       }
       pages.back().append(section[next++]);
     }
@@ -94,17 +116,22 @@ bool PaintSketch(QPagedPaintDevice& device, const QString& sketch) {
   painter.setFont(font);
   const QFontMetricsF metrics(font, &device);
   const double step = metrics.lineSpacing();
-  const int perPage = std::max(1, static_cast<int>(device.height() / step));
+  const int lines = static_cast<int>(device.height() / step);
+  const int perPage = std::max(1, lines - kFootLines);
 
-  bool firstPage = true;
-  for (const QStringList& page : SketchPages(sketch, perPage)) {
-    if (!firstPage && !device.newPage()) return false;
-    firstPage = false;
+  const std::vector<QStringList> pages = SketchPages(sketch, perPage);
+  const QString count = QString::number(pages.size());
+  for (std::size_t i = 0; i < pages.size(); ++i) {
+    if (i > 0 && !device.newPage()) return false;
     double y = metrics.ascent();
-    for (const QString& line : page) {
+    for (const QString& line : pages[i]) {
       painter.drawText(QPointF(0, y), line);
       y += step;
     }
+    // The number at the page's foot, in the middle.
+    const QRectF foot(0, std::max(lines - 1, 0) * step, device.width(), step);
+    painter.drawText(foot, Qt::AlignHCenter | Qt::AlignTop,
+                     Text(kPageNumber).arg(QString::number(i + 1), count));
   }
   return painter.end();
 }

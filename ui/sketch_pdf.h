@@ -17,15 +17,16 @@ namespace kavu::ui {
 inline constexpr const char* kSketchFont = "Noto Mono";
 
 // The sketch text laid on pages of at most linesPerPage lines: each station
-// starts a page; a station longer than a page goes on with the form's column
-// heads repeated.
+// starts a page; a station longer than a page goes on under a line naming the
+// station followed by "(tiếp)" and the form's column heads repeated.
 std::vector<QStringList> SketchPages(const QString& sketch, int linesPerPage);
 
 // The .sdo file (TCVN3) as text; empty when it cannot be read.
 QString ReadSketch(const std::string& utf8Path);
 
-// The pages painted on a PDF writer or a printer, A4 portrait; false when the
-// device could not be painted on.
+// The pages painted on a PDF writer or a printer, A4 portrait, each with its
+// number and the count at its foot ("Trang 2/5"); false when the device could
+// not be painted on.
 bool PaintSketch(QPagedPaintDevice& device, const QString& sketch);
 
 // Written whole or not at all; false when the file could not be written.

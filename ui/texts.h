@@ -153,19 +153,51 @@ inline constexpr std::string_view kReplace = "Thay thế";
 inline constexpr std::string_view kReplaceAll = "Thay tất cả";
 inline constexpr std::string_view kNotFoundAgain = "Không tìm thấy! Có tìm tiếp không";
 
-// The map window.
+// The map window. An "&" marks the access key of a menu entry; the captions of
+// the save dialogs and of the print preview leave it out.
 inline constexpr std::string_view kMapTitle = "Bản đồ: ";
-inline constexpr std::string_view kFit = "Vừa cửa sổ";
-inline constexpr std::string_view kSaveView = "Lưu hình đang xem";
-inline constexpr std::string_view kSaveWhole = "Lưu hình cả khu đo";
-inline constexpr std::string_view kSaveSketch = "Lưu sổ đo PDF";
-inline constexpr std::string_view kPrintSketch = "In sổ đo";
+inline constexpr std::string_view kFileMenu = "&File";
+inline constexpr std::string_view kViewMenu = "&Xem";
+inline constexpr std::string_view kZoomIn = "Phóng &to";
+inline constexpr std::string_view kZoomOut = "Thu &nhỏ";
+inline constexpr std::string_view kFit = "&Vừa cửa sổ";
+inline constexpr std::string_view kSaveView = "Lưu hình đang &xem";
+inline constexpr std::string_view kSaveWhole = "Lưu hình cả &khu đo";
+inline constexpr std::string_view kSaveSketch = "Lưu sổ đo &PDF";
+inline constexpr std::string_view kPrintSketch = "&In sổ đo";
+inline constexpr std::string_view kCloseMap = "Đón&g";
+// What each action does; its keys follow in brackets.
+inline constexpr std::string_view kZoomInTip = "Phóng to quanh giữa bản đồ";
+inline constexpr std::string_view kZoomOutTip = "Thu nhỏ quanh giữa bản đồ";
+inline constexpr std::string_view kFitTip = "Cả khu đo vừa trong cửa sổ";
+inline constexpr std::string_view kSaveViewTip = "Ghi phần bản đồ đang xem thành hình PNG hoặc SVG";
+inline constexpr std::string_view kSaveWholeTip = "Ghi cả khu đo thành hình PNG hoặc SVG";
+inline constexpr std::string_view kSaveSketchTip = "Ghi sổ đo chi tiết thành File PDF khổ A4";
+inline constexpr std::string_view kPrintSketchTip = "Xem trước và in sổ đo chi tiết";
+inline constexpr std::string_view kNoSketchTip =
+    "Lần tính này không tạo sổ đo: chọn \"Tạo File sổ đo\" rồi tính lại";
+inline constexpr std::string_view kCloseMapTip = "Đóng cửa sổ bản đồ";
+inline constexpr std::string_view kCanvasTip =
+    "Con lăn chuột: phóng to, thu nhỏ; kéo chuột hoặc phím mũi tên: dịch bản đồ; bấm vào một "
+    "điểm để xem số liệu của nó";
 inline constexpr std::string_view kPictureFilter = "Hình PNG (*.png);;Hình SVG (*.svg)";
 inline constexpr std::string_view kPdfFilter = "File PDF (*.pdf)";
 inline constexpr std::string_view kReportLines = "Báo lỗi:";
 inline constexpr std::string_view kRecordAt = "Sổ đo, dòng ";
 inline constexpr std::string_view kHint = "Bấm vào một điểm để xem số liệu của nó.";
+// By MapKind: what a point is.
 inline constexpr std::string_view kPointKinds[] = {"Điểm khống chế", "Trạm máy", "Cọc phụ",
                                                    "Điểm chi tiết"};
+// The legend's entry for a point named in the error report.
+inline constexpr std::string_view kFlaggedKind = "Có báo lỗi";
+
+// The field sketch on paper: the line that starts a station's section, the
+// line that names its station, and on a page that goes on with a station,
+// its name followed by this; the number of each page at its foot.
+inline constexpr std::string_view kSketchSection = "Lược đồ số:";
+inline constexpr std::string_view kSketchStation = "Điểm trạm đo:";
+inline constexpr std::string_view kSketchArea = "Khu đo:";
+inline constexpr std::string_view kContinued = " (tiếp)";
+inline constexpr std::string_view kPageNumber = "Trang %1/%2";
 
 }  // namespace kavu::ui
