@@ -1546,6 +1546,10 @@ Hãy bỏ một trong hai.</translation>
         <translation>Ctrl</translation>
     </message>
     <message>
+        <source>+</source>
+        <translation>+</translation>
+    </message>
+    <message>
         <source>Del</source>
         <translation>Del</translation>
     </message>

@@ -558,6 +558,8 @@ void MapWindow::askSketch() {
 
 void MapWindow::printSketch() {
   QPrinter printer;
+  // The print job, and a print to a file, are named after the job.
+  printer.setDocName(QFileInfo(ProposedPath(Q(fieldBook_), QStringLiteral("pdf"))).completeBaseName());
   QPrintPreviewDialog preview(&printer, this);
   preview.setObjectName(QStringLiteral("inSodo"));
   preview.setWindowTitle(Plain(kPrintSketch));
