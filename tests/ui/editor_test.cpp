@@ -14,8 +14,8 @@
 #include <QPushButton>
 #include <QTextBlock>
 #include <QtTest>
-#include <functional>
 #include <set>
+#include <string_view>
 
 #include "core/host.h"
 #include "core/tcvn3.h"
@@ -121,45 +121,25 @@ class EditorTest : public QObject {
       auto* box = window.findChild<QPlainTextEdit*>();
       const QString name = Native(desk.path(viewer ? "job1.err" : "job1.asc"));
       const QString caption = Q(viewer ? kMoreAboutFile : kDataOfFile);
-      const auto reread = [&desk, viewer] {
-        if (viewer) {
-          desk.view("job1.err");
-        } else {
-          desk.press(desk.w, "suasolieu");
+      QCOMPARE(window.windowTitle(), caption + name);
+      // t types, u undoes, s saves; c and n read the file again, the
+      // edits kept (Cancel) or dropped (No).
+      for (const char step : std::string_view("tutstcn")) {
+        if (step == 't') box->insertPlainText(QStringLiteral("x"));
+        if (step == 'u') box->undo();
+        if (step == 's') desk.press(window, viewer ? "ghixem" : "ghi");
+        if (step == 'c' || step == 'n') {
+          desk.person.answers = {step == 'c' ? MsgAnswer::Cancel : MsgAnswer::No};
+          if (viewer) desk.view("job1.err");
+          if (!viewer) desk.press(desk.w, "suasolieu");
         }
-      };
-      const struct {
-        const char* what;
-        std::function<void()> act;
-        bool edited;
-      } steps[] = {
-          {"opened", [] {}, false},
-          {"typed", [&] { box->insertPlainText(QStringLiteral("x")); }, true},
-          {"undone", [&] { box->undo(); }, false},
-          {"typed again", [&] { box->insertPlainText(QStringLiteral("y")); }, true},
-          {"saved", [&] { desk.press(window, viewer ? "ghixem" : "ghi"); }, false},
-          {"typed after the save", [&] { box->insertPlainText(QStringLiteral("z")); }, true},
-          {"reread, cancelled",
-           [&] {
-             desk.person.answers = {MsgAnswer::Cancel};
-             reread();
-           },
-           true},
-          {"reread, edits dropped",
-           [&] {
-             desk.person.answers = {MsgAnswer::No};
-             reread();
-           },
-           false},
-      };
-      for (const auto& step : steps) {
-        step.act();
-        const QString what = QString::fromLatin1(step.what) + (viewer ? " (viewer)" : " (editor)");
-        QVERIFY2(window.hasUnsavedEdits() == step.edited, qPrintable(what));
-        QCOMPARE(window.windowTitle(), caption + (step.edited ? "*" : "") + name);
+        const bool edited = step == 't' || step == 'c';
+        const char what[] = {step, viewer ? 'v' : 'e', 0};
+        QVERIFY2(window.hasUnsavedEdits() == edited, what);
+        QCOMPARE(window.windowTitle(), caption + (edited ? "*" : "") + name);
       }
       QCOMPARE(desk.read(viewer ? "job1.err" : "job1.asc"),
-               QByteArray(viewer ? "yreport\r\n" : "yTR K1 1.5\r\n"));
+               QByteArray(viewer ? "xreport\r\n" : "xTR K1 1.5\r\n"));
     }
   }
 
@@ -244,9 +224,7 @@ class EditorTest : public QObject {
       const char *result, *told;
     } cases[] = {
         {"a-a-a", "a", 0, "X-X-X", "Đã thay 3 chỗ."},
-        {"a-a-a", "a", 2, "a-X-X", "Đã thay 2 chỗ."},
         {"Đường ĐƯỜNG", "đường", 0, "X X", "Đã thay 2 chỗ."},
-        {"abc", "z", 0, "abc", "Không tìm thấy chỗ nào để thay."},
         {"abc abc", "abc", 5, "abc abc", "Không tìm thấy chỗ nào để thay."},
     };
     for (const auto& c : cases) {
