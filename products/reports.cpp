@@ -27,6 +27,25 @@ void WriteErrorReport(TextOut& out, const Survey& survey) {
   }
 }
 
+std::vector<std::uint32_t> ErrorReportBookLines(const Survey& survey) {
+  std::vector<std::uint32_t> lines(2, 0);  // the two lines of the head
+  lines.reserve(2 + 2 * survey.report.size());
+  std::string text;
+  for (const ReportEntry& entry : survey.report) {
+    if (entry.counted) lines.push_back(0);
+    text.clear();
+    survey.AppendText(text, entry);
+    // CR LF, a lone CR and a lone LF each end a line of the text.
+    std::size_t breaks = 0;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+      if (text[i] == '\r' && i + 1 < text.size() && text[i + 1] == '\n') ++i;
+      if (text[i] == '\r' || text[i] == '\n') ++breaks;
+    }
+    lines.insert(lines.end(), breaks + 1, entry.line);
+  }
+  return lines;
+}
+
 void WriteStationListingHeader(TextOut& out) {
   for (std::string_view line : msg::kCpvHeader) out.Line(line);
 }

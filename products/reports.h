@@ -1,7 +1,9 @@
 // The run's own reports and text products.
 #pragma once
 
+#include <cstdint>
 #include <string>
+#include <vector>
 
 #include "core/lines.h"
 #include "core/survey.h"
@@ -11,6 +13,11 @@ namespace kavu {
 // The error report (.err): its head, then each message, an error set off by
 // an empty line.
 void WriteErrorReport(TextOut& out, const Survey& survey);
+// For each line of the error report as WriteErrorReport lays it out, the
+// field-book line of the record it concerns (0 for the head, the empty lines
+// and a message about no record). A message that holds a line break takes a
+// line of the report for each of its lines, as a text window shows them.
+std::vector<std::uint32_t> ErrorReportBookLines(const Survey& survey);
 void WriteStationListingHeader(TextOut& out);
 // The station listing's line for each computed station: station, orientation,
 // azimuth from the orientation point, orientation distance, first and last

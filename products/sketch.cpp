@@ -97,12 +97,16 @@ void WriteStation(TextOut& out, const FormWords& w, const Survey& survey,
   const SketchTexts& t = station.sketch;
   const std::string orientation = FixedWidth(station.orientation.name, 12);
   out.Line("");
-  out.Line(w.sketchNumber + FixedWidth(nhap[1], 6) + std::string(kSketchTitle));
+  // Header text i cut to its width and set in its column.
+  const auto field = [&nhap](std::size_t i) {
+    return FixedWidth(std::string_view(nhap[i]).substr(0, kSketchHeaderWidths[i]),
+                      kSketchHeaderColumns[i]);
+  };
+  out.Line(w.sketchNumber + field(1) + std::string(kSketchTitle));
   out.Line("");
-  out.Line(w.station + FixedWidth(station.station.name, 12) + w.area + FixedWidth(nhap[0], 39));
-  out.Line(w.instrument + FixedWidth(nhap[2], 19) + w.instrumentNumber + FixedWidth(nhap[3], 20));
-  out.Line(w.surveyor + FixedWidth(nhap[4], 17) + w.recorder + FixedWidth(nhap[5], 18) + w.date +
-           FixedWidth(nhap[6], 10));
+  out.Line(w.station + FixedWidth(station.station.name, 12) + w.area + field(0));
+  out.Line(w.instrument + field(2) + w.instrumentNumber + field(3));
+  out.Line(w.surveyor + field(4) + w.recorder + field(5) + w.date + field(6));
   out.Line(w.stationCoordinates + NumberWidth(t.stationX, 11) +
            "    Y= " + NumberWidth(t.stationY, 10) + "    Z= " + NumberWidth(t.stationZ, 10));
   out.Line(w.orientation1 + orientation + " X= " + NumberWidth(t.orientationX, 11) + "    Y= " +

@@ -249,7 +249,10 @@ TextWindow::TextWindow(const Asker& ask, Timthay& finder, int ktra, const char* 
   text_->setFont(QFontDatabase::systemFont(QFontDatabase::FixedFont));
   text_->setLineWrapMode(QPlainTextEdit::NoWrap);
   save_ = MakeButton(this, saveName, Q(kSave));
+  save_->setToolTip(Q(kSaveTip));
   find_ = MakeButton(this, findName, Q(kFind));
+  find_->setToolTip(Q(kFindTip));
+  connect(text_, &QPlainTextEdit::modificationChanged, this, &TextWindow::showTitle);
   // What a text editor's user presses without thinking.
   const auto key = [this](QKeySequence sequence, auto action) {
     auto* shortcut = new QShortcut(sequence, this);
@@ -270,9 +273,10 @@ bool TextWindow::showText(const QString& path, const QString& backup, std::strin
   }
   file_ = path;
   backup_ = backup;
+  caption_ = caption;
   text_->setPlainText(text);
   text_->document()->setModified(false);
-  setWindowTitle(Q(caption) + QDir::toNativeSeparators(path));
+  showTitle();
   show();
   raise();
   return true;
@@ -283,6 +287,24 @@ bool TextWindow::save(bool confirmed) {
   if (!SaveWithBackup(ask_, file_, backup_, BoxText(text_), confirmed)) return false;
   text_->document()->setModified(false);
   return true;
+}
+
+bool TextWindow::hasUnsavedEdits() const {
+  return !file_.isEmpty() && text_->document()->isModified();
+}
+
+void TextWindow::showTitle() {
+  if (file_.isEmpty()) return;
+  // As desktop editors mark a file with unsaved edits: "*" before its name.
+  const QString mark = hasUnsavedEdits() ? Q(kUnsavedMark) : QString();
+  setWindowTitle(Q(caption_) + mark + QDir::toNativeSeparators(file_));
+}
+
+void TextWindow::selectLine(const QTextBlock& block) {
+  QTextCursor cursor(block);
+  cursor.movePosition(QTextCursor::EndOfBlock, QTextCursor::KeepAnchor);
+  text_->setTextCursor(cursor);
+  text_->centerCursor();
 }
 
 bool TextWindow::maySave() {
@@ -315,8 +337,10 @@ Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
     : TextWindow(ask, finder, 2, "txtxem", "ghixem", "Timxem", parent) {
   setObjectName(QStringLiteral("xem"));
   setWindowTitle(Q(kViewerCaption));
-  // No cancel button: Esc must not close the viewer by accident.
-  thoat_ = MakeButton(this, "thoat", Q(kExit));
+  thoat_ = MakeButton(this, "thoat", Q(kExitButton));
+  thoat_->setToolTip(Q(kCloseTip));
+  // Esc closes it as it does the editor, asking first about unsaved edits.
+  setCancelButton(thoat_);
   setMinimumSize(Px(3800 + 200), Px(2400));
   Place(this, false, thoat_->sizeHint().height());
   text_->viewport()->installEventFilter(this);
@@ -328,17 +352,53 @@ Xem::Xem(const Asker& ask, Timthay& finder, QWidget* parent)
 void Xem::showFile(const QString& path, const QString& text) {
   // The backup keeps the whole name, so a report's backup never replaces the
   // field book's "name.bak".
-  showText(path, path + QStringLiteral(".bak"), kMoreAboutFile, text);
+  const bool shown = showText(path, path + QStringLiteral(".bak"), kMoreAboutFile, text);
+  if (shown) shown_ = StampOf(path);
+}
+
+Xem::Stamp Xem::StampOf(const QString& path) {
+  const QFileInfo info(path);
+  if (!info.exists()) return {};
+  return {info.size(), info.lastModified()};
+}
+
+void Xem::setRunReport(const QString& reportPath, std::vector<std::uint32_t> bookLines) {
+  runReport_ = reportPath;
+  runReportStamp_ = StampOf(reportPath);
+  bookLines_ = std::move(bookLines);
+  // The report on the screen becomes the run's, unless it holds edits of the
+  // user's.
+  if (!isVisible() || hasUnsavedEdits() || QFileInfo(file()) != QFileInfo(reportPath)) return;
+  if (const std::optional<QString> text = ReadScreenText(reportPath)) {
+    text_->setPlainText(*text);
+    text_->document()->setModified(false);
+    shown_ = StampOf(reportPath);
+  }
+}
+
+std::uint32_t Xem::bookLineOf(int block) const {
+  // The map tells the lines of the report the run wrote: of no use once the
+  // report shown was edited (here, or saved since), or is an earlier one.
+  if (bookLines_.empty() || file().isEmpty() || QFileInfo(file()) != QFileInfo(runReport_) ||
+      hasUnsavedEdits() || runReportStamp_.size < 0 || shown_ != runReportStamp_ ||
+      StampOf(file()) != runReportStamp_) {
+    return 0;
+  }
+  return block >= 0 && static_cast<std::size_t>(block) < bookLines_.size()
+             ? bookLines_[static_cast<std::size_t>(block)]
+             : 0;
 }
 
 bool Xem::eventFilter(QObject* watched, QEvent* event) {
-  // A double click on a line of the error report shows the point's record.
+  // A double click on a line of the error report shows the record it is
+  // about; without the run's map, the first record of the point it names.
   if (watched == text_->viewport() && event->type() == QEvent::MouseButtonDblClick && openPoint_) {
     const auto* click = static_cast<QMouseEvent*>(event);
-    const QString point =
-        PointOfReportLine(text_->cursorForPosition(click->position().toPoint()).block().text());
-    if (!point.isEmpty()) {
-      openPoint_(file(), point);
+    const QTextBlock block = text_->cursorForPosition(click->position().toPoint()).block();
+    const QString point = PointOfReportLine(block.text());
+    const std::uint32_t line = bookLineOf(block.blockNumber());
+    if (line > 0 || !point.isEmpty()) {
+      openPoint_(file(), point, line);
       return true;
     }
   }
@@ -361,9 +421,11 @@ Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
     : TextWindow(ask, finder, 1, "txtsuasl", "ghi", "timkiem", parent), viewer_(viewer) {
   setObjectName(QStringLiteral("suasl"));
   setWindowTitle(Q(kEditorCaption));
-  xemfile_ = MakeButton(this, "xemfile", Q(kViewFile));
+  xemfile_ = MakeButton(this, "xemfile", Q(kViewFileButton));
+  xemfile_->setToolTip(Q(kViewFileTip));
   xemfile_->setDefault(true);
-  thoat_ = MakeButton(this, "thoat", Q(kExit));
+  thoat_ = MakeButton(this, "thoat", Q(kExitButton));
+  thoat_->setToolTip(Q(kCloseTip));
   setCancelButton(thoat_);
   chooser_ = [this](const QString& folder, const QString& proposed) {
     const QString chosen = ChooseFile(this, Q(kViewFile), folder, {Q(kErrFiles), Q(kAllFiles)});
@@ -372,11 +434,13 @@ Suasl::Suasl(const Asker& ask, Timthay& finder, Xem& viewer, QWidget* parent)
   // The four buttons side by side, with a margin.
   setMinimumSize(Px(4300 + 200), Px(2400));
   Place(this, true, thoat_->sizeHint().height());
-  viewer_.setPointOpener([this](const QString& report, const QString& point) {
-    // The report "name.err" belongs to the field book "name.asc".
-    const QString book = QFileInfo(report).path() + QDir::separator() +
-                         QFileInfo(report).completeBaseName() + QStringLiteral(".asc");
-    showPoint(QDir::toNativeSeparators(book), point);
+  viewer_.setPointOpener([this](const QString& report, const QString& point, std::uint32_t line) {
+    const QString book = bookOf(report);
+    if (line > 0) {
+      showLine(book, line);
+    } else {
+      showPoint(book, point);
+    }
   });
   connect(save_, &QPushButton::clicked, this, &Suasl::ghi_Click);
   connect(find_, &QPushButton::clicked, this, &Suasl::timkiem_Click);
@@ -390,24 +454,49 @@ bool Suasl::openFile(const QString& filesl, const QString& daufile, const QStrin
   // file list must not send this text over another file.
   if (!showText(filesl, daufile + QStringLiteral(".bak"), kDataOfFile, text)) return false;
   tentm_ = tentm;
+  daufile_ = daufile;
   return true;
 }
 
-bool Suasl::showPoint(const QString& book, const QString& point) {
-  if (QFileInfo(book) != QFileInfo(file()) || !isVisible()) {
-    const std::optional<QString> text = ReadScreenText(book);
-    // The backup base is the path before its first ".", as for the main
-    // window's file.
-    if (!text ||
-        !openFile(book, book.section(QLatin1Char('.'), 0, 0), QFileInfo(book).path(), *text)) {
-      return false;
-    }
+QString Suasl::bookOf(const QString& report) const {
+  // The run of "job1.asc" reports to "job1.err" (the path before its first
+  // "." with ".err"); a file of an instrument is computed as the field book
+  // made of it, the report's name with ".asc".
+  if (!file().isEmpty() && file().endsWith(QStringLiteral(".asc"), Qt::CaseInsensitive) &&
+      QFileInfo(daufile_ + QStringLiteral(".err")) == QFileInfo(report)) {
+    return file();
   }
+  const QFileInfo info(report);
+  return QDir::toNativeSeparators(info.path() + QDir::separator() + info.completeBaseName() +
+                                  QStringLiteral(".asc"));
+}
+
+bool Suasl::showBook(const QString& book) {
+  if (QFileInfo(book) == QFileInfo(file()) && isVisible()) return true;
+  const std::optional<QString> text = ReadScreenText(book);
+  // The backup base is the path before its first ".", as for the main
+  // window's file.
+  return text &&
+         openFile(book, book.section(QLatin1Char('.'), 0, 0), QFileInfo(book).path(), *text);
+}
+
+bool Suasl::showPoint(const QString& book, const QString& point) {
+  if (!showBook(book)) return false;
   QTextBlock block = text_->document()->firstBlock();
   while (block.isValid() && FirstField(block.text()) != point) block = block.next();
   if (!block.isValid()) return false;
-  text_->setTextCursor(QTextCursor(block));
-  text_->centerCursor();
+  selectLine(block);
+  show();
+  raise();
+  activateWindow();
+  return true;
+}
+
+bool Suasl::showLine(const QString& book, std::uint32_t line) {
+  if (line == 0 || !showBook(book)) return false;
+  const QTextBlock block = text_->document()->findBlockByNumber(static_cast<int>(line - 1));
+  if (!block.isValid()) return false;
+  selectLine(block);
   show();
   raise();
   activateWindow();

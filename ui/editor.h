@@ -3,15 +3,19 @@
 #pragma once
 
 #include <QByteArray>
+#include <QDateTime>
 #include <QPlainTextEdit>
 #include <QString>
+#include <cstdint>
 #include <functional>
 #include <optional>
 #include <string_view>
+#include <vector>
 
 #include "ui/dialog.h"
 
 class QPushButton;
+class QTextBlock;
 
 namespace kavu::ui {
 
@@ -73,6 +77,9 @@ class TextWindow : public Window {
   // Asks whether to save unsaved edits: true when they are saved or may be
   // dropped, false when the user stays (or the save failed).
   bool maySave();
+  // The text shown differs from the file's as last read or saved; the title
+  // marks it.
+  bool hasUnsavedEdits() const;
 
  protected:
   // Builds the text box, then the save and find buttons (in that tab order);
@@ -87,6 +94,8 @@ class TextWindow : public Window {
   bool save(bool confirmed = false);
   void find();
   void closeEvent(QCloseEvent* event) override;
+  // The whole line of the text box's block selected and shown.
+  void selectLine(const QTextBlock& block);
 
   const Asker& ask_;
   QPlainTextEdit* text_;
@@ -95,9 +104,12 @@ class TextWindow : public Window {
   QPushButton* thoat_ = nullptr;
 
  private:
+  void showTitle();
+
   Timthay& finder_;
   int ktra_;
   QString file_, backup_;
+  std::string_view caption_;
 };
 
 class Xem : public TextWindow {
@@ -107,11 +119,18 @@ class Xem : public TextWindow {
   QPlainTextEdit* txtxem() const { return text_; }
   // Shows a file's text; its saves go to that file, the backup beside it.
   void showFile(const QString& path, const QString& text);
-  // Called with the report's path and the point that a double-clicked line
-  // names.
-  void setPointOpener(std::function<void(const QString&, const QString&)> opener) {
-    openPoint_ = std::move(opener);
-  }
+  // The error report a run has just written and, for each of its lines, the
+  // field-book line of the record it concerns (0 for none), once the report
+  // is in place. While the viewer shows that report as the run wrote it, a
+  // double click on one of its lines opens the record itself; a viewer that
+  // shows the report's file without edits shows the new report.
+  void setRunReport(const QString& reportPath, std::vector<std::uint32_t> bookLines);
+  // Called with the report's path, the point that a double-clicked line
+  // names and the field-book line of its record (0 when not known: the record
+  // is found by the point's name).
+  using PointOpener =
+      std::function<void(const QString& report, const QString& point, std::uint32_t line)>;
+  void setPointOpener(PointOpener opener) { openPoint_ = std::move(opener); }
 
   void ghixem_Click() { save(); }
   void Timxem_Click() { find(); }
@@ -121,7 +140,21 @@ class Xem : public TextWindow {
   bool eventFilter(QObject* watched, QEvent* event) override;
 
  private:
-  std::function<void(const QString&, const QString&)> openPoint_;
+  // A file's size and time of change: whether it is still as it was.
+  struct Stamp {
+    qint64 size = -1;
+    QDateTime changed;
+    bool operator==(const Stamp&) const = default;
+  };
+  static Stamp StampOf(const QString& path);
+  // The record line of the report's block, when the report's map holds.
+  std::uint32_t bookLineOf(int block) const;
+
+  PointOpener openPoint_;
+  Stamp shown_;  // the file shown, as it was read
+  QString runReport_;
+  Stamp runReportStamp_;
+  std::vector<std::uint32_t> bookLines_;
 };
 
 class Suasl : public TextWindow {
@@ -137,8 +170,15 @@ class Suasl : public TextWindow {
   bool openFile(const QString& filesl, const QString& daufile, const QString& tentm,
                 const QString& text);
   // The field book at the first record of a point (from a line of its error
-  // report); false when the book or the point is not there.
+  // report), that line selected; false when the book or the point is not
+  // there.
   bool showPoint(const QString& book, const QString& point);
+  // The field book at a line (from 1), that line selected; false when the book
+  // or the line is not there.
+  bool showLine(const QString& book, std::uint32_t line);
+  // The field book an error report is about: the file shown when the report
+  // is its own ("job1.err" of "job1.asc"), else the report's name with ".asc".
+  QString bookOf(const QString& report) const;
 
   void ghi_Click() { save(); }
   void timkiem_Click() { find(); }
@@ -148,9 +188,13 @@ class Suasl : public TextWindow {
   void resizeEvent(QResizeEvent* event) override;  // Form_Resize
 
  private:
+  // The book shown (read first when another file is shown or the editor is
+  // closed); false when it could not be or the user kept unsaved edits.
+  bool showBook(const QString& book);
+
   Xem& viewer_;
   FileChooser chooser_;
-  QString tentm_;
+  QString tentm_, daufile_;
   QPushButton* xemfile_;
 };
 

@@ -115,8 +115,9 @@ inline constexpr std::array<std::pair<std::string_view, char>, 20> kMainAccessKe
 
 // Field-book header form.
 inline constexpr std::string_view kHeaderCaption = "Nhập thông tin về sổ đo";
+// The labels' access keys (&) take their boxes.
 inline constexpr std::array<std::string_view, 7> kHeaderLabels = {
-    "Khu đo:", "Lược đồ số:", "Máy đo:", "Số máy: ", "Người đo:", "Người ghi:", "Ngày đo:"};
+    "&Khu đo:", "&Lược đồ số:", "&Máy đo:", "&Số máy: ", "Người đ&o:", "Người &ghi:", "Ngà&y đo:"};
 inline constexpr std::array<std::string_view, 7> kHeaderDefaults = {
     "Xã Tân Phú, huyện Đông Sơn",
     "01",
@@ -125,18 +126,37 @@ inline constexpr std::array<std::string_view, 7> kHeaderDefaults = {
     "Nguyễn Văn An",
     "Trần Văn Bình",
     ""};  // the date: today's, as dd/mm/yyyy
-// The characters the field sketch keeps of each text.
-inline constexpr std::array<int, 7> kHeaderWidths = {39, 6, 19, 20, 17, 18, 10};
-inline constexpr std::string_view kEnter = "Nhập";
+inline constexpr std::string_view kEnter = "&Nhập";
+inline constexpr std::string_view kEnterTip =
+    "Giữ các thông tin này cho sổ đo và ẩn cửa sổ (Enter)";
+inline constexpr std::string_view kHeaderExitTip =
+    "Giữ các thông tin này cho sổ đo và đóng cửa sổ (Esc)";
+// Beside each box: the characters it holds, "/", the most the sketch prints.
+inline constexpr std::string_view kHeaderCountTip =
+    "Số ký tự đã nhập / số ký tự nhiều nhất sổ đo in được";
 
 // Editor, viewer, help.
 inline constexpr std::string_view kEditorCaption = "Sữa chữa số liệu";
 inline constexpr std::string_view kViewerCaption =
     "Trợ giúp chương trình tính toạ độ điểm chi tiết";
 inline constexpr std::string_view kMoreAboutFile = "Thông tin thêm về File: ";
-inline constexpr std::string_view kSave = "Ghi";
-inline constexpr std::string_view kFind = "Tìm";
+inline constexpr std::string_view kSave = "&Ghi";
+inline constexpr std::string_view kFind = "&Tìm";
 inline constexpr std::string_view kViewFile = "Xem File";
+inline constexpr std::string_view kViewFileButton = "&Xem File";
+// The exit button of the editor, the viewer, the find window and the header
+// form.
+inline constexpr std::string_view kExitButton = "T&hoát";
+inline constexpr std::string_view kSaveTip =
+    "Ghi nội dung lên File; nội dung cũ được giữ ở File .bak (Ctrl+S)";
+inline constexpr std::string_view kFindTip =
+    "Tìm kiếm và thay thế trong nội dung (Ctrl+F, F3 tìm tiếp)";
+inline constexpr std::string_view kViewFileTip =
+    "Mở một File khác ở cửa sổ xem, thường là File báo lỗi (.err)";
+inline constexpr std::string_view kCloseTip =
+    "Đóng cửa sổ; hỏi có ghi không khi có sửa đổi chưa ghi (Esc)";
+// Put before the file's name in the title while it has unsaved edits.
+inline constexpr std::string_view kUnsavedMark = "*";
 inline constexpr std::string_view kOverwrite = "Có ghi đè lên File số liệu đã có không ?";
 inline constexpr std::string_view kErrPattern = "*.err";
 // Asked before unsaved edits are dropped: this text, the path, "?".
@@ -144,14 +164,23 @@ inline constexpr std::string_view kSaveChanges = "Lưu thay đổi vào File ";
 
 // Find and replace.
 inline constexpr std::string_view kFindCaption = "Tìm kiếm và thay thế";
-inline constexpr std::string_view kFindWhat = "Tìm chuỗi ký tự:";
-inline constexpr std::string_view kReplaceWith = "Chuỗi thay thế:";
-inline constexpr std::string_view kMatchCase = "Phân biệt chữ viết Hoa";
-inline constexpr std::string_view kWholeWord = "Tìm một từ nguyên vẹn";
-inline constexpr std::string_view kFindNext = "Tìm tiếp";
-inline constexpr std::string_view kReplace = "Thay thế";
-inline constexpr std::string_view kReplaceAll = "Thay tất cả";
+inline constexpr std::string_view kFindWhat = "Tìm chuỗi &ký tự:";
+inline constexpr std::string_view kReplaceWith = "Chuỗi tha&y thế:";
+inline constexpr std::string_view kMatchCase = "&Phân biệt chữ viết Hoa";
+inline constexpr std::string_view kWholeWord = "Tìm một từ &nguyên vẹn";
+inline constexpr std::string_view kFindNext = "&Tìm tiếp";
+inline constexpr std::string_view kReplace = "Th&ay thế";
+inline constexpr std::string_view kReplaceAll = "Thay tất &cả";
 inline constexpr std::string_view kNotFoundAgain = "Không tìm thấy! Có tìm tiếp không";
+inline constexpr std::string_view kFindNextTip = "Tìm và chọn chỗ tiếp theo (Enter, F3)";
+inline constexpr std::string_view kReplaceTip = "Thay chỗ đang chọn rồi chọn chỗ tiếp theo";
+inline constexpr std::string_view kReplaceAllTip = "Thay mọi chỗ từ vị trí con trỏ trở đi";
+inline constexpr std::string_view kFindExitTip = "Đóng cửa sổ tìm kiếm (Esc)";
+// After "Thay tất cả": this text, the count, the next; or the last when there
+// was nothing to replace.
+inline constexpr std::string_view kReplacedCount = "Đã thay ";
+inline constexpr std::string_view kReplacedPlaces = " chỗ.";
+inline constexpr std::string_view kReplacedNone = "Không tìm thấy chỗ nào để thay.";
 
 // The map window. An "&" marks the access key of a menu entry; the captions of
 // the save dialogs and of the print preview leave it out.

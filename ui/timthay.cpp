@@ -66,6 +66,8 @@ Timthay::Timthay(const Asker& ask, std::function<QPlainTextEdit*(int)> target, Q
   chon2_->setObjectName(QStringLiteral("chon2"));
   chon1_ = new QCheckBox(Q(kWholeWord), this);
   chon1_->setObjectName(QStringLiteral("chon1"));
+  label1->setBuddy(txttim_);
+  label2->setBuddy(txtthay_);
   grid->addWidget(label1, 0, 0);
   grid->addWidget(txttim_, 0, 1);
   grid->addWidget(label2, 1, 0);
@@ -74,10 +76,14 @@ Timthay::Timthay(const Asker& ask, std::function<QPlainTextEdit*(int)> target, Q
   grid->addWidget(chon1_, 3, 0, 1, 2);
 
   tim_ = MakeButton(this, "tim", Q(kFindNext));
+  tim_->setToolTip(Q(kFindNextTip));
   tim_->setDefault(true);
   thay1_ = MakeButton(this, "thay1", Q(kReplace));
+  thay1_->setToolTip(Q(kReplaceTip));
   thay2_ = MakeButton(this, "thay2", Q(kReplaceAll));
-  auto* thoat = MakeButton(this, "thoat", Q(kExit));
+  thay2_->setToolTip(Q(kReplaceAllTip));
+  auto* thoat = MakeButton(this, "thoat", Q(kExitButton));
+  thoat->setToolTip(Q(kFindExitTip));
   setCancelButton(thoat);
   auto* column = new QVBoxLayout;
   for (QPushButton* button : {tim_, thay1_, thay2_, thoat}) column->addWidget(button);
@@ -190,26 +196,30 @@ void Timthay::thay2_Click() {
        at = search(text, at + chuoitim.size())) {
     matches.push_back(at);
   }
-  if (!matches.empty()) {
-    const QString chuoithay = txtthay_->text();
-    QTextCursor cursor(box->document());
-    cursor.beginEditBlock();
-    // From the end back, so the positions found stay valid.
-    for (auto at = matches.rbegin(); at != matches.rend(); ++at) {
-      cursor.setPosition(static_cast<int>(*at));
-      cursor.setPosition(static_cast<int>(*at + chuoitim.size()), QTextCursor::KeepAnchor);
-      cursor.insertText(chuoithay);
-    }
-    cursor.endEditBlock();
-    const qsizetype behind =
-        matches.back() +
-        static_cast<qsizetype>(matches.size() - 1) * (chuoithay.size() - chuoitim.size()) +
-        chuoithay.size();
-    cursor.setPosition(static_cast<int>(behind));
-    box->setTextCursor(cursor);
+  if (matches.empty()) {
+    ask_(Q(kReplacedNone), MsgIcon::Information, MsgButtons::Ok);
+    return;
   }
-  // The search that finds nothing more asks its question, as a step does.
-  notFound(box);
+  const QString chuoithay = txtthay_->text();
+  QTextCursor cursor(box->document());
+  cursor.beginEditBlock();
+  // From the end back, so the positions found stay valid.
+  for (auto at = matches.rbegin(); at != matches.rend(); ++at) {
+    cursor.setPosition(static_cast<int>(*at));
+    cursor.setPosition(static_cast<int>(*at + chuoitim.size()), QTextCursor::KeepAnchor);
+    cursor.insertText(chuoithay);
+  }
+  cursor.endEditBlock();
+  const qsizetype behind =
+      matches.back() +
+      static_cast<qsizetype>(matches.size() - 1) * (chuoithay.size() - chuoitim.size()) +
+      chuoithay.size();
+  cursor.setPosition(static_cast<int>(behind));
+  box->setTextCursor(cursor);
+  // How many were replaced, in place of the question of a step that finds
+  // nothing more: the caret stays behind the last replacement.
+  ask_(Q(kReplacedCount) + QString::number(matches.size()) + Q(kReplacedPlaces),
+       MsgIcon::Information, MsgButtons::Ok);
 }
 
 void Timthay::thoat_Click() { close(); }

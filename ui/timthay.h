@@ -38,7 +38,8 @@ class Timthay : public Window {
   // Replaces the selected match and selects the next; a match not yet
   // selected (the first one from the caret on) is selected first.
   void thay1_Click();
-  // Replaces every match from the caret on, the one at the caret included.
+  // Replaces every match from the caret on, the one at the caret included,
+  // and tells how many it replaced.
   void thay2_Click();
   // F3 in the editor or the viewer: the next match, or the window when there
   // is nothing to search for.

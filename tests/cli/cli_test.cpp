@@ -127,7 +127,7 @@ TEST(Example, TruePointsSameSeedSameProductsHeaderTexts) {
   const std::vector<std::pair<std::string, std::string>> header = {
       {"--area", "Xã Đông Hội"},       {"--sketch-no", "07"},
       {"--instrument", "NIKON DTM"},   {"--instrument-no", "A1234"},
-      {"--surveyor", "Nguyễn Văn An"}, {"--recorder", "Trần Thị Bình Minh"},
+      {"--surveyor", "Nguyễn Văn An"}, {"--recorder", "Trần Thị Bình Mai"},
       {"--date", "12/5/2004"}};
   std::vector<std::string> args = {"--all", "--seed", "42", "--height-decimals", "3"};
   for (const auto& [option, text] : header) args.insert(args.end(), {option, text});
@@ -175,8 +175,9 @@ TEST(Example, TruePointsSameSeedSameProductsHeaderTexts) {
     EXPECT_NE(sketch.find(Utf8ToTcvn3(text)), std::string::npos) << option;
   }
   EXPECT_EQ(sketch.find("TOPCOM"), std::string::npos);  // the default was replaced
-  // Surveyor, recorder and date in their widths of 17, 18 (filled) and 10.
-  EXPECT_NE(sketch.find(Utf8ToTcvn3("2. Người đo: Nguyễn Văn An    Người ghi: Trần Thị Bình Minh"
+  // Surveyor, recorder and date in their columns of 17, 18 (filled, a space
+  // before the next label) and 10.
+  EXPECT_NE(sketch.find(Utf8ToTcvn3("2. Người đo: Nguyễn Văn An    Người ghi: Trần Thị Bình Mai "
                                     "Ngày đo:12/5/2004 \r\n")),
             std::string::npos);
   // The seed does reach the generator: the sketch's orientation rows draw from it.
