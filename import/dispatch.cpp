@@ -15,8 +15,6 @@ namespace fs = std::filesystem;
 
 namespace {
 
-// Widths of the header texts in the field sketch.
-constexpr std::array<std::size_t, 7> kHeaderWidths{39, 6, 19, 20, 17, 18, 10};
 
 std::string WithSeparator(const fs::path& folder) {
   std::string text = Utf8FromPath(folder);
@@ -112,11 +110,8 @@ std::optional<std::string> CheckAndConvert(RunState& st, Host& host, FileLock* j
   st.cbkieu = kind;
   host.ShowFolder(st.tentm, PatternOfKind(kind));
   host.SelectKind(kind);
-  if (Ticked(st.fsdo)) {
-    for (std::size_t i = 0; i < kHeaderWidths.size(); ++i) {
-      st.nhap[i] = FixedWidth(st.nhapsdo[i], kHeaderWidths[i]);
-    }
-  }
+  // The sketch's writer cuts each header text to its field.
+  if (Ticked(st.fsdo)) st.nhap = st.nhapsdo;
   std::error_code ec;
   if (fs::file_size(PathFromUtf8(st.filesl), ec) == 0 && !ec) {
     RefuseFile(st, host,

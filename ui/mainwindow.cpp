@@ -31,6 +31,7 @@
 #include "core/tcvn3.h"
 #include "core/typed_numbers.h"
 #include "import/dispatch.h"
+#include "products/reports.h"
 #include "ui/editor.h"
 #include "ui/lists.h"
 #include "ui/map_window.h"
@@ -112,6 +113,20 @@ bool SamePath(const QString& a, const QString& b) {
   return QDir::cleanPath(left.absoluteFilePath()) == QDir::cleanPath(right.absoluteFilePath());
 }
 
+// The help's list of the instrument files the program converts, from the
+// table of formats: the kind list's text (or, in English, what the file is)
+// and the pattern.
+QString FormatsHtml(bool english) {
+  QStringList items;
+  for (const Format& format : Formats()) {
+    if (format.convert == nullptr) continue;
+    QString text = Q(english ? format.about : format.listText);
+    if (!english) text = text.left(text.indexOf(QLatin1Char('['))).simplified();
+    items << text + QStringLiteral(" (<b>") + Q(format.pattern).mid(1) + QStringLiteral("</b>)");
+  }
+  return items.join(QStringLiteral(", "));
+}
+
 // The recent files: a key of their own, the paths one a line.
 constexpr const char* kRecentKey = "KAVU_Recent";
 constexpr qsizetype kRecentCount = 8;
@@ -180,6 +195,10 @@ MapWindow& MainWindow::mapWindow() {
 
 void MainWindow::afterRun() {
   if (ending_ || lastRun_.outcome != RunOutcome::Completed) return;
+  // A double click on a line of the report opens the record it concerns.
+  xem_->setRunReport(QDir::toNativeSeparators(Q(st_.daufile + ".err")),
+                     lastRun_.err > 0 ? ErrorReportBookLines(lastRun_.survey)
+                                      : std::vector<std::uint32_t>{});
   mapStale_ = true;
   bando_->setEnabled(true);
   if (ckBando_->isChecked() || (map_ && map_->isVisible())) bando_Click();
@@ -579,23 +598,22 @@ bool MainWindow::unsavedEditsSettled() {
   QStringList read{Q(st_.filesl)};
   if (Ticked(BoxState(ckKC_))) read.append(txtFKC_->text().trimmed());
   struct Shown {
-    QPlainTextEdit* text;
-    QString file;
+    TextWindow* window;
     std::function<void()> save;
   };
-  for (const Shown& shown : {Shown{suasl_->txtsuasl(), suasl_->file(), [this] { suasl_->ghi_Click(); }},
-                             Shown{xem_->txtxem(), xem_->file(), [this] { xem_->ghixem_Click(); }}}) {
-    if (!shown.text->document()->isModified()) continue;
+  for (const Shown& shown : {Shown{suasl_.get(), [this] { suasl_->ghi_Click(); }},
+                             Shown{xem_.get(), [this] { xem_->ghixem_Click(); }}}) {
+    if (!shown.window->hasUnsavedEdits()) continue;
     bool readByRun = false;
-    for (const QString& path : read) readByRun = readByRun || SamePath(shown.file, path);
+    for (const QString& path : read) readByRun = readByRun || SamePath(shown.window->file(), path);
     if (!readByRun) continue;
-    tbao_ = ask_(Q(kSaveChanges) + QDir::toNativeSeparators(shown.file) + QStringLiteral("?"),
+    tbao_ = ask_(Q(kSaveChanges) + QDir::toNativeSeparators(shown.window->file()) + QStringLiteral("?"),
                  MsgIcon::Question, MsgButtons::YesNoCancel);
     if (tbao_ == MsgAnswer::Cancel) return false;
     if (tbao_ == MsgAnswer::Yes) {
       shown.save();
       // Not saved: nothing is computed (the save said why).
-      if (shown.text->document()->isModified()) return false;
+      if (shown.window->hasUnsavedEdits()) return false;
     }
   }
   return true;
@@ -643,12 +661,7 @@ void MainWindow::fsdo_Click() {
   nhapsdo_Click();
 }
 
-void MainWindow::nhapsdo_Click() {
-  Nhapsdo& form = headerForm();
-  form.show();
-  form.raise();
-  form.activateWindow();
-}
+void MainWindow::nhapsdo_Click() { headerForm().showForm(); }
 
 void MainWindow::KC_Click() {
   const QString chosen = chooseControlFile_ ? chooseControlFile_() : QString();
@@ -691,7 +704,10 @@ void MainWindow::trogiup_Click() {
     help_->resize(640, 560);
   }
   auto* browser = help_->findChild<QTextBrowser*>(QStringLiteral("helptext"));
-  browser->setHtml(QString::fromUtf8(file.readAll()));
+  QString html = QString::fromUtf8(file.readAll());
+  html.replace(QStringLiteral("<!--formats-en-->"), FormatsHtml(true));
+  html.replace(QStringLiteral("<!--formats-->"), FormatsHtml(false));
+  browser->setHtml(html);
   help_->show();
   help_->raise();
 }

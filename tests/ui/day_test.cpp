@@ -12,6 +12,7 @@
 #include <QPlainTextEdit>
 #include <QProgressBar>
 #include <QPushButton>
+#include <QTextBrowser>
 #include <QtTest>
 #include <set>
 #include <sstream>
@@ -170,7 +171,16 @@ class DayTest : public QObject {
       QCOMPARE(desk.w.viewer().isVisible(), errors);
       if (errors) {
         QCOMPARE(QFileInfo(desk.w.viewer().file()).fileName(), QStringLiteral("job1.err"));
-        QVERIFY(desk.w.viewer().txtxem()->toPlainText().contains(QLatin1String("P99")));
+        QPlainTextEdit* report = desk.w.viewer().txtxem();
+        QVERIFY(report->toPlainText().contains(QLatin1String("P99")));
+        // A double click on its line opens the field book at the record, selected.
+        const QTextCursor at = report->document()->find(QStringLiteral("P99"));
+        QVERIFY(!at.isNull());
+        QTest::mouseDClick(report->viewport(), Qt::LeftButton, {},
+                           report->cursorRect(at).center());
+        QVERIFY(desk.w.editor().isVisible());
+        QCOMPARE(desk.w.editor().txtsuasl()->textCursor().selectedText(),
+                 QStringLiteral("P99 0901500"));
       }
       QVERIFY(Child<QPushButton>(desk.w, "bando")->isEnabled());
     }
@@ -261,6 +271,12 @@ class DayTest : public QObject {
     QVERIFY(desk.w.headerFormLoaded() && desk.w.headerForm().isVisible());
     QVERIFY(desk.w.headerForm().grab().save(QStringLiteral(KAVU_PICTURES "/kavu-header-form.png")));
     QVERIFY(desk.w.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-main-options.png")));
+    // The help lists the instrument files from the table of formats.
+    Child<QPushButton>(desk.w, "trogiup")->click();
+    QVERIFY(desk.w.helpWindow() != nullptr);
+    const QString help = Child<QTextBrowser>(*desk.w.helpWindow(), "helptext")->toPlainText();
+    QVERIFY2(help.contains(QStringLiteral("Số liệu FieldBook SDR (.sdr)")), qPrintable(help));
+    QVERIFY(help.contains(QStringLiteral("Topcom 226 column file (.tcm)")));
   }
 };
 

@@ -378,7 +378,8 @@ class DialogsTest : public QObject {
       }
       QVERIFY(*shown);
       QVERIFY2(found.isEmpty(), qPrintable(found.join(QLatin1Char('\n'))));
-      QCOMPARE(QString(accept).remove(QLatin1Char('&')), c.own ? Q(kOpen) : Q(kSave));
+      QCOMPARE(QString(accept).remove(QLatin1Char('&')),
+               (c.own ? Q(kOpen) : Q(kSave)).remove(QLatin1Char('&')));
       for (std::size_t i = 0; i < c.files.size(); ++i) {
         QStringList expected = c.files[i].columns;
         if (expected[1].isEmpty())
@@ -426,8 +427,6 @@ class DialogsTest : public QObject {
     }
 
     // The program's help window and its header form, which keeps its texts.
-    const QString helpFile = QCoreApplication::applicationDirPath() + QStringLiteral("/kavu.hlp");
-    if (!QFileInfo::exists(helpFile)) WriteAll(helpFile, "<p>Tr\xe1\xbb\xa3 gi\xc3\xbap</p>");
     Desk desk;
     desk.w.trogiup_Click();
     Window* help = desk.w.helpWindow();
