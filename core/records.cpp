@@ -1,5 +1,8 @@
 #include "core/records.h"
 
+#include <algorithm>
+#include <span>
+
 #include "core/control_points.h"
 #include "core/lines.h"
 #include "core/numbers.h"
@@ -9,11 +12,11 @@
 namespace kavu {
 namespace {
 
-using Fields = std::vector<std::string_view>;
+using Fields = std::span<const std::string_view>;
 
 // The fields of a normalised copy of raw, as views into raw: every field
 // stands there unchanged, after the one before it.
-void IntoLine(std::string_view raw, Fields& fields) {
+void IntoLine(std::string_view raw, std::vector<std::string_view>& fields) {
   std::size_t at = 0;
   for (std::string_view& field : fields) {
     at = raw.find(field, at);
@@ -123,14 +126,15 @@ void TypeBody(Record& r, const Fields& f, std::string_view station, std::string_
 // the run up to the same line; its body lines keep their kinds.
 class StationWalk {
  public:
+  // The fields of working line k are fields[starts[k]] to fields[starts[k + 1]].
   StationWalk(std::vector<Record>& records, const std::vector<std::size_t>& working,
-              const std::vector<Fields>& fields)
-      : records_(records), working_(working), fields_(fields) {}
+              const std::vector<std::string_view>& fields, const std::vector<std::size_t>& starts)
+      : records_(records), working_(working), fields_(fields), starts_(starts) {}
 
   void Run() {
     std::size_t hand = Read();
     while (!AtEnd()) {
-      const Fields& station = fields_[hand];
+      const Fields station = FieldsOf(hand);
       const bool isStation = IsStation(station);
       if (isStation) {
         TypeStation(At(hand), station);
@@ -138,7 +142,7 @@ class StationWalk {
         TypeMalformed(At(hand), station);
       }
       hand = Read();
-      const Fields& orientation = fields_[hand];
+      const Fields orientation = FieldsOf(hand);
       const bool isOrientation = IsOrientation(orientation);
       if (isOrientation) {
         TypeOrientation(At(hand), orientation);
@@ -152,8 +156,8 @@ class StationWalk {
       const std::string_view orientationName = isOrientation ? orientation[1] : std::string_view();
       while (!AtEnd()) {
         hand = Read();
-        if (EndsBody(fields_[hand])) break;
-        TypeBody(At(hand), fields_[hand], stationName, orientationName);
+        if (EndsBody(FieldsOf(hand))) break;
+        TypeBody(At(hand), FieldsOf(hand), stationName, orientationName);
       }
     }
   }
@@ -163,10 +167,14 @@ class StationWalk {
   // The index of the next working line.
   std::size_t Read() { return next_++; }
   Record& At(std::size_t k) { return records_[working_[k]]; }
+  Fields FieldsOf(std::size_t k) const {
+    return Fields(fields_).subspan(starts_[k], starts_[k + 1] - starts_[k]);
+  }
 
   std::vector<Record>& records_;
   const std::vector<std::size_t>& working_;
-  const std::vector<Fields>& fields_;
+  const std::vector<std::string_view>& fields_;
+  const std::vector<std::size_t>& starts_;
   std::size_t next_ = 0;
 };
 
@@ -174,13 +182,15 @@ class StationWalk {
 
 std::vector<Record> ReadRecords(std::string_view book) {
   std::vector<Record> records;
-  std::vector<std::size_t> working;  // positions in records
-  std::vector<Fields> fields;        // of each working line
+  records.reserve(static_cast<std::size_t>(std::count(book.begin(), book.end(), '\n')) + 1);
+  std::vector<std::size_t> working;      // positions in records
+  std::vector<std::string_view> fields;  // of the working lines, one after the other
+  std::vector<std::size_t> starts{0};    // where each line's fields start
   // The station loop reads the working copy only when a station record
   // stands on a line of it that another line follows.
   bool stationSeen = false, reachable = false;
   std::string normalised;
-  Fields split;
+  std::vector<std::string_view> split;
   LineReader reader(book);
   for (std::string_view raw; reader.Next(raw);) {
     Record& record = records.emplace_back();
@@ -200,9 +210,10 @@ std::vector<Record> ReadRecords(std::string_view book) {
     reachable = reachable || stationSeen;
     stationSeen = stationSeen || IsStation(split);
     working.push_back(records.size() - 1);
-    fields.push_back(split);
+    fields.insert(fields.end(), split.begin(), split.end());
+    starts.push_back(fields.size());
   }
-  if (reachable) StationWalk(records, working, fields).Run();
+  if (reachable) StationWalk(records, working, fields, starts).Run();
   return records;
 }
 
