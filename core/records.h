@@ -179,9 +179,14 @@ inline constexpr BookLayout kPlainBook = [] {
 // SDR books with 4-character identifiers (.sdr, .gre).
 inline constexpr BookLayout kSdrBook =
     layout::Book(layout::kControl, layout::kStation, layout::Shot(4, layout::kCodeAndNote));
-// SDR books with 16-character identifiers (.obs): no description.
-inline constexpr BookLayout kSokkiaBook =
-    layout::Book(layout::kControl, layout::kStation, layout::Shot(10, std::nullopt));
+// SDR books with 16-character identifiers (.obs): no description, but the
+// shot on the backsight names its point.
+inline constexpr BookLayout kSokkiaBook = [] {
+  using namespace layout;
+  BookLayout book = Book(kControl, kStation, Shot(10, std::nullopt));
+  book.shotOnBlockPoint = Shot(10, kCodeAndNote);
+  return book;
+}();
 // SET files: the code cut and padded to 12, but the orientation shot names
 // its point as it stands.
 inline constexpr BookLayout kSetBook = [] {
