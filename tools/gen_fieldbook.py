@@ -6,7 +6,10 @@ gen_fieldbook.py SEED OUT
 Most records are ordinary set-ups and detail points on a grid of control
 points; a few per book are the records that exercise the checks: duplicates,
 pegs, check sights, orientation distances, angles out of range, run-together
-and blank fields, long names, control points that are missing.
+and blank fields, long names, control points that are missing. Then the
+corners that real files have: tabs (also at the end of a line), runs of
+blanks, blanks before a record, names of 12 characters and more, and line
+ends of CR alone.
 """
 import random
 import sys
@@ -21,6 +24,28 @@ def packed(rng, low=0.0, high=360.0):
     if rng.random() < 0.3:
         text += f".{rng.randint(0, 9)}"
     return text
+
+
+def corner(rng, line):
+    """The line as a real file may hold it, now and then."""
+    roll = rng.random()
+    fields = line.split(" ")
+    if roll < 0.02:
+        return line + "\t"  # a field left empty at the end
+    if roll < 0.03 and len(fields) > 1:
+        return "\t".join(fields) + "\t"
+    if roll < 0.05 and len(fields) > 1:
+        return (" " * rng.randint(2, 4)).join(fields)
+    if roll < 0.06:
+        return " " * rng.randint(1, 3) + line
+    if roll < 0.075 and len(fields) > 1 and fields[0] not in ("TR", "DKD"):
+        # a point name of 12 characters or more
+        fields[0] = (fields[0] + "ABCDEFGHIJKLMNOP")[: rng.randint(12, 14)]
+        return " ".join(fields)
+    if roll < 0.08 and len(fields) > 2 and fields[0] == "TR":
+        fields[1] = (fields[1] + "-ABCDEFGHIJKLMNOP")[: rng.randint(12, 13)]
+        return " ".join(fields)
+    return line
 
 
 def main():
@@ -78,6 +103,12 @@ def main():
     if rng.random() < 0.2:
         lines.insert(rng.randrange(len(lines) + 1), f"TR {controls[0]} 1000.000 2000.000")
     sep = "\r\n" if rng.random() < 0.9 else "\n"
+    # The corners draw from a generator of their own, so that the books
+    # above stay as they were drawn.
+    corners = random.Random(seed * 7919 + 1)
+    lines = [corner(corners, line) for line in lines]
+    if corners.random() < 0.05:
+        sep = "\r"
     with open(sys.argv[2], "wb") as out:
         out.write((sep.join(lines) + sep).encode("latin-1"))
 
