@@ -563,7 +563,11 @@ RunResult tinh_Click(RunState& st, Host& host) {
   if (!result.written.empty()) {
     text += "\r" + std::string(msg::kFilesWritten) + "\r";
     for (const std::string& path : result.written) {
-      text += std::string(msg::kWrittenIndent) + Utf8FromPath(PathFromUtf8(path).filename()) + "\r";
+      // Named from the job's folder: the TRIDO book stands beside it.
+      std::filesystem::path shown =
+          PathFromUtf8(path).lexically_relative(PathFromUtf8(st.tentm));
+      text += std::string(msg::kWrittenIndent) +
+              Utf8FromPath(shown.empty() ? PathFromUtf8(path) : shown.make_preferred()) + "\r";
     }
   }
   text += "\r" + std::string(msg::kContinue);
