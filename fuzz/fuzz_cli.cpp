@@ -1,8 +1,9 @@
 // The batch command's handling of its arguments, with a kind chosen by hand:
 // the first byte picks the kind of the table of formats, the bytes up to the
 // first NUL are options, one a line (only lines that begin with "-" are
-// passed, so that the products stay in the fuzzer's folder), and the rest is
-// the chosen file, named with the kind's extension (".dat" for any other).
+// passed, and no picture option, so that the products stay in the fuzzer's
+// folder), and the rest is the chosen file, named with the kind's extension
+// (".dat" for any other).
 #include <cstddef>
 #include <cstdint>
 #include <filesystem>
@@ -34,7 +35,11 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
   kavu::fuzzing::WriteFile(file, content);
   std::vector<std::string> args{"--kind", std::to_string(kind), "--seed", "1"};
   for (const std::string& line : kavu::SplitLines(options)) {
-    if (line.starts_with("-")) args.push_back(line);
+    // A picture option takes the next line, whatever it is, as its file and
+    // would write it outside the folder: pictures are left out.
+    const bool picture =
+        line.starts_with("--png") || line.starts_with("--svg") || line.starts_with("--pdf");
+    if (line.starts_with("-") && !picture) args.push_back(line);
   }
   args.push_back(file.string());
   const std::vector<std::string_view> views(args.begin(), args.end());
