@@ -101,8 +101,7 @@ struct ComputationFields {
   double gpv = 0, cdh = 0;
 
   // The current point.
-  double GocD = 0, ccg = 0;
-  double dx = 0, dy = 0, dz = 0;
+  double ccg = 0;
   double xi = 0, yi = 0, zi = 0;
   double pv2 = 0, scgcd = 0;
   double X = 0, Y = 0, Z = 0;

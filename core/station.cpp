@@ -8,6 +8,7 @@
 #include "core/messages.h"
 #include "core/numbers.h"
 #include "core/results.h"
+#include "core/survey_math.h"
 #include "core/tcvn3.h"
 #include "core/text.h"
 
@@ -32,27 +33,6 @@ bool NumbersMissing(RunState& st, std::initializer_list<std::size_t> fields) {
     }
   }
   return false;
-}
-
-// The packed angle split into degrees, minutes and seconds as gocdo reads it:
-// integer division and remainder work on the angle rounded to a whole number.
-// The degrees are not yet reduced below 360.
-AngleParts SplitPacked(double goc) {
-  const double whole = RoundEvenWhole(goc);
-  AngleParts parts;
-  parts.do1 = std::trunc(whole / 10000);
-  // The remainder of a whole number below 2^53 is that of its integer.
-  const double minutesAndSeconds =
-      std::fabs(whole) < 9007199254740992.0
-          ? static_cast<double>(static_cast<std::int64_t>(whole) % 10000)
-          : std::fmod(whole, 10000);
-  parts.phut = static_cast<std::int16_t>(std::trunc(minutesAndSeconds / 100));
-  parts.giay = RoundEven((goc / 100 - std::trunc(whole / 100)) * 100.00001, 1);
-  return parts;
-}
-
-double PartsDegrees(const AngleParts& parts) {
-  return (parts.do1 + parts.phut / 60.0) + parts.giay / 3600;
 }
 
 // The checks of a detail or peg observation before it is computed. A record
@@ -97,26 +77,14 @@ void ComputeObservation(RunState& st, const Observation& o) {
   TinhToaDo(st);
 }
 
-// Azimuth and distance from (xFrom, yFrom) to the station, reported against
-// the station and otherName.
+// Azimuth and distance from the orientation (or check) point to the station,
+// reported against the station and otherName.
 void Orient(RunState& st, std::string_view otherName) {
-  const double dx = st.xTR - st.xDKD;
-  const double dy = st.yTR - st.yDKD;
-  // The angle is held in single precision, as the office's tables were made.
-  float theta;
-  if (dx > 0) {
-    theta = static_cast<float>(std::atan(dy / dx));
-  } else if (dx < 0) {
-    theta = static_cast<float>(std::atan(dy / dx) + kPi);
-  } else {
-    theta = static_cast<float>(dy >= 0 ? kPi / 2 : kPi / 2 + kPi);
-  }
-  st.gpv = static_cast<double>(theta) * 180 / kPi;
-  if (st.gpv < 0) st.gpv += 360;
-  if (st.gpv >= 360) st.gpv -= 360;
+  const Bearing bearing = BearingBetween(st.xDKD, st.yDKD, st.xTR, st.yTR);
+  st.gpv = bearing.azimuth;
   st.goc = st.gpv;
   GocString(st);
-  st.cdh = std::sqrt(dx * dx + dy * dy);
+  st.cdh = bearing.distance;
   if (st.cdh > 10000) {
     ReportError(st,
                 std::string(msg::kPointColon) + st.TenTram.str() + std::string(msg::kOr) +
@@ -143,34 +111,24 @@ void NotePoint(RunState& st, PointKind kind, bool words, bool listed) {
 
 }  // namespace
 
-double PackedDegrees(double packed) {
-  AngleParts parts = SplitPacked(std::fabs(packed));
-  if (parts.do1 >= 360) parts.do1 = std::fmod(parts.do1, 360);
-  return PartsDegrees(parts);
-}
+double PackedDegrees(double packed) { return DecodePacked(packed).degrees; }
 
 void gocdo(RunState& st) {
-  if (st.goc < 0) {
-    st.goc = std::fabs(st.goc);
-    EntryError(st, msg::kNegativeAngle);
-  }
+  const DecodedAngle angle = DecodePacked(st.goc);
+  if (angle.negative) EntryError(st, msg::kNegativeAngle);
   if (st.s < 0) {
     st.s = std::fabs(st.s);
     EntryError(st, msg::kNegativeDistance);
   }
-  AngleParts parts = SplitPacked(st.goc);
-  if (parts.do1 >= 360) {
-    EntryError(st, msg::kWrongDegrees);
-    parts.do1 = std::fmod(parts.do1, 360);
-  }
-  if (parts.phut >= 60) EntryError(st, msg::kWrongMinutes);
-  if (parts.giay >= 60) EntryError(st, msg::kWrongSeconds);
-  if (st.s > 2000 || st.s < 0) EntryError(st, msg::kDistanceMayBeWrong);
-  st.do1 = parts.do1;
-  st.phut = parts.phut;
-  st.giay = parts.giay;
-  st.goc = PartsDegrees(parts);
-  st.rad = st.goc * kPi / 180;
+  if (angle.degreesOver) EntryError(st, msg::kWrongDegrees);
+  if (angle.minutesOver) EntryError(st, msg::kWrongMinutes);
+  if (angle.secondsOver) EntryError(st, msg::kWrongSeconds);
+  if (st.s > 2000) EntryError(st, msg::kDistanceMayBeWrong);
+  st.do1 = angle.parts.do1;
+  st.phut = angle.parts.phut;
+  st.giay = angle.parts.giay;
+  st.goc = angle.degrees;
+  st.rad = Radians(st.goc);
 }
 
 void GocString(RunState& st) {
@@ -189,24 +147,14 @@ void TinhPhuongViCanh(RunState& st) { Orient(st, st.TenDinhHuong.str()); }
 
 void TinhDoCao(RunState& st) {
   gocdo(st);
-  st.GocD = st.goc;
-  st.goc = 90 - st.goc;
-  st.rad = st.goc * kPi / 180;
-  st.dz = std::tan(st.rad) * st.s;
-  st.zi = st.zTR + st.dz + Val(st.ccm) - st.ccg;
+  st.zi = PointHeight(st.zTR, st.goc, st.s, Val(st.ccm), st.ccg);
 }
 
 void TinhToaDo(RunState& st) {
   gocdo(st);
-  // The azimuth is held in single precision at every step.
-  float a = static_cast<float>((st.pvd + st.goc) - 180);
-  if (a < 0) a = static_cast<float>(a + 360.0);
-  if (a >= 360) a = static_cast<float>(a - 360.0);
-  a = static_cast<float>(a * kPi / 180.0000001);
-  st.dx = std::cos(static_cast<double>(a)) * st.s;
-  st.dy = std::sin(static_cast<double>(a)) * st.s;
-  st.xi = RoundEven(st.xTR + st.dx, 3);
-  st.yi = RoundEven(st.yTR + st.dy, 3);
+  const Radiated point = Radiate(st.xTR, st.yTR, st.pvd, st.goc, st.s);
+  st.xi = point.x;
+  st.yi = point.y;
   st.s = RoundEven(st.s, 3);
 }
 
@@ -309,10 +257,7 @@ void STP7(RunState& st) {
     sketch.checkX = st.StX.str();
     sketch.checkY = st.StY.str();
     Orient(st, sketch.checkName);
-    st.scgcd = st.gpv - st.pvd;
-    if (st.scgcd >= 360) st.scgcd -= 360;
-    if (st.scgcd < 0) st.scgcd += 360;
-    st.scgcd = st.pv2 - st.scgcd;
+    st.scgcd = CheckResidual(st.pv2, st.gpv, st.pvd);
     st.goc = st.scgcd;
     GocString(st);
     StationResult& station = st.survey.stations.back();
