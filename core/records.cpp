@@ -83,7 +83,7 @@ void TypeMalformed(Record& r, const Fields& f) {
 }
 
 // Names of a block as the run compares them: their first 12 characters.
-bool SameName(std::string_view a, std::string_view b) { return a.substr(0, 12) == b.substr(0, 12); }
+bool SameName(std::string_view a, std::string_view b) { return a.substr(0, kNameWidth) == b.substr(0, kNameWidth); }
 
 void TypeBody(Record& r, const Fields& f, std::string_view station, std::string_view orientation) {
   r.name = f[0];

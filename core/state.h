@@ -89,7 +89,7 @@ struct ComputationFields {
   // Station and orientation.
   int I = 1;
   int n = 0;
-  FixedText<12> TenKC, TenTram, TenDinhHuong, TenDiem;
+  FixedText<kNameWidth> TenKC, TenTram, TenDinhHuong, TenDiem;
   std::string StXTram, StYTram, StZTram;
   std::string StXDinhHuong, StYDinhHuong, StZDinhHuong;
   double xTR = 0, yTR = 0, zTR = 0;

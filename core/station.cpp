@@ -173,7 +173,7 @@ void CheckPegReadings(RunState& st, std::size_t firstPoint) {
     if (point.kind() != PointKind::Peg) continue;
     const std::string_view record = st.survey.Record(point);
     if (ReadingTooLong(RecordField(record, 1))) {
-      ReportPoint(st, RecordField(record, 5).substr(0, 12), msg::kWrongDegrees);
+      ReportPoint(st, RecordField(record, 5).substr(0, kNameWidth), msg::kWrongDegrees);
       return;
     }
   }

@@ -10,8 +10,6 @@
 namespace kavu {
 
 namespace {
-// A name is shown in 12 columns; a longer one whole.
-constexpr std::size_t kNameWidth = 12;
 }  // namespace
 
 // A million points and their report lines fit in little memory.

@@ -48,6 +48,9 @@ std::string LString(std::string_view text, int width);
 // and ".", otherwise 0.
 int KTraCCG(std::string_view text);
 
+// A point name: its significant characters, and its column in the products.
+inline constexpr std::size_t kNameWidth = 12;
+
 // A fixed-width text field of the computation state (names 12, X 11, Y 10...).
 // A name is cut to the width; a number (Cut = false) is only padded.
 template <std::size_t N, bool Cut = true>

@@ -44,7 +44,7 @@ class Names {
       auto [it, fresh] = (set_up ? set_ups : labels_).try_emplace(Identifier(line, layout.id));
       if (fresh || it->second.empty()) {
         const std::string_view text = TrimView(description);
-        it->second = text.size() < 3 ? std::string() : Trim(FixedWidth(text, 12));
+        it->second = text.size() < 3 ? std::string() : Trim(FixedWidth(text, kNameWidth));
       }
     }
     labels_.merge(set_ups);  // keeps the name an "08" record gives
@@ -124,7 +124,7 @@ class SdrWriter {
     if (instrument_height_.empty()) instrument_height_ = "0.0";
     const std::string_view description = TrimView(layout_.description.Of(line));
     if (!wide_ && names_.Known(id) == nullptr && description.size() > 2) {
-      station_name_ = BlankFreeName(Trim(FixedWidth(Columns(line, 49, 60), 12)));
+      station_name_ = BlankFreeName(Trim(FixedWidth(Columns(line, 49, 60), kNameWidth)));
     } else {
       station_name_ = names_.Of(id);
     }
@@ -178,7 +178,7 @@ class SdrWriter {
       if (!oriented_) {
         const std::string note = Trim(layout_.note.Of(line));
         if (!backsight_found_ && note.size() > 2) {
-          backsight_name_ = BlankFreeName(Trim(FixedWidth(note, 12)));
+          backsight_name_ = BlankFreeName(Trim(FixedWidth(note, kNameWidth)));
         }
         Orient();
       }

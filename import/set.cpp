@@ -33,13 +33,13 @@ std::string StationName(std::string_view setup) {
   const std::string_view id = TrimView(Columns(setup, 5, 20));
   if (!id.empty()) return BlankFreeName(id);
   const std::string_view description = TrimView(Columns(setup, 85, 100));
-  return BlankFreeName(description.size() < 3 ? "DKC" : Trim(FixedWidth(description, 12)));
+  return BlankFreeName(description.size() < 3 ? "DKC" : Trim(FixedWidth(description, kNameWidth)));
 }
 
 // The target of an observation; one without identifier keeps its code.
 std::string TargetName(std::string_view observation) {
   const std::string_view id = TrimView(Columns(observation, 21, 36));
-  return BlankFreeName(id.empty() ? Trim(FixedWidth(TrimView(Columns(observation, 85, 100)), 12))
+  return BlankFreeName(id.empty() ? Trim(FixedWidth(TrimView(Columns(observation, 85, 100)), kNameWidth))
                                   : id);
 }
 
@@ -101,7 +101,7 @@ Conversion ConvertSet(std::string_view content) {
       put(LString(TargetName(line), 6) + GocSt(TurnReading(shot.reading, first.reading)) +
           DistanceText(shot.distance) + GocSt(shot.zenith) +
           PrismHeightText(entries[i].prism_height) + " " +
-          FixedWidth(TrimView(Columns(line, 85, 100)), 12));
+          FixedWidth(TrimView(Columns(line, 85, 100)), kNameWidth));
     }
   }
   return result;

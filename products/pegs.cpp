@@ -22,7 +22,7 @@ constexpr int kColumn = 8;
 void WritePegFileHead(TextOut& out, const Survey& survey, bool heights) {
   for (std::size_t i = 0; i < survey.knownRead; ++i) {
     const KnownPoint& point = survey.known[i];
-    std::string line = "TR " + FixedWidth(point[0], 12) + " " + NumberWidth(point[1], 11) + " " +
+    std::string line = "TR " + FixedWidth(point[0], kNameWidth) + " " + NumberWidth(point[1], 11) + " " +
                        NumberWidth(point[2], 10);
     if (heights) line += " " + NumberWidth(point[3], 10);
     out.Line(line);
@@ -38,8 +38,8 @@ void WritePegBlocks(TextOut& out, const Survey& survey) {
       station = point.station;
       ended = false;
       const StationResult& s = survey.stations[point.station];
-      out.Line("TR " + FixedWidth(s.station.name, 12));
-      out.Line("DKD1 " + FixedWidth(s.orientation.name, 12));
+      out.Line("TR " + FixedWidth(s.station.name, kNameWidth));
+      out.Line("DKD1 " + FixedWidth(s.orientation.name, kNameWidth));
       if (!s.checkRecord.empty()) out.Line(s.checkRecord);
     }
     if (ended) continue;
@@ -49,7 +49,7 @@ void WritePegBlocks(TextOut& out, const Survey& survey) {
     const auto f = [&](std::size_t k) { return RecordField(record, k); };
     ended = ReadingTooLong(f(1));
     if (ended) continue;
-    out.Line(" " + FixedWidth(f(5), 12) + RString(f(1), kColumn) + NumberColumn(f(2), kColumn) +
+    out.Line(" " + FixedWidth(f(5), kNameWidth) + RString(f(1), kColumn) + NumberColumn(f(2), kColumn) +
              NumberColumn(f(3), kColumn) + " " + std::string(f(4)) + " " + std::string(f(6)));
   }
 }

@@ -72,7 +72,7 @@ void WriteStationListing(TextOut& out, const Survey& survey) {
   };
   for (std::size_t i = 0; i < survey.stations.size(); ++i) {
     const StationResult& s = survey.stations[i];
-    out.Line(FixedWidth(s.station.name, 12) + FixedWidth(s.orientation.name, 12) + " " +
+    out.Line(FixedWidth(s.station.name, kNameWidth) + FixedWidth(s.orientation.name, kNameWidth) + " " +
              GocStringText(s.backBearing) + " " + OrientationDistanceText(s.orientationDistance) +
              "    " + name(ends[i].first) + " -  " + name(ends[i].last));
   }
@@ -114,13 +114,13 @@ void AppendCoordinateTextLine(std::string& out, const Survey& survey, const Comp
 
 std::string ControlListingLine(const Survey& survey, const ControlListing& entry) {
   if (!entry.point) {
-    return ControlLine(FixedWidth(entry.name, 12), entry.x, entry.y,
+    return ControlLine(FixedWidth(entry.name, kNameWidth), entry.x, entry.y,
                        entry.height ? &entry.z : nullptr);
   }
   const ComputedPoint& point = survey.points[*entry.point];
   const std::string z = NumberWidth(HeightText(point.z), 10);
   std::string line =
-      ControlLine(FixedWidth(entry.name, 12), NumberWidth(NorthingText(point.x), 11),
+      ControlLine(FixedWidth(entry.name, kNameWidth), NumberWidth(NorthingText(point.x), 11),
                   NumberWidth(EastingText(point.y), 10), entry.height ? &z : nullptr);
   if (point.kind() == PointKind::Peg && !survey.Note(point).empty()) {
     line += " ";
@@ -135,7 +135,7 @@ void AppendCoordinateListingLine(std::string& out, const Survey& survey, const C
   std::array<std::string_view, 7> f;
   const std::size_t fields = RecordFields(survey.Text(p.record, std::string_view::npos), f);
   const std::size_t from = out.size();
-  out.append(f[0].substr(0, 12));
+  out.append(f[0].substr(0, kNameWidth));
   PadBehind(out, from, 5);
   AppendColumn(out, p.x, kNorthingMask, 12);
   AppendColumn(out, p.y, kEastingMask, 12);
@@ -161,8 +161,8 @@ void WriteStationRecords(TextOut& out, const Survey& survey, bool coordinates) {
     if (point.station != station) {
       station = point.station;
       const StationResult& s = survey.stations[point.station];
-      out.Line("TR " + FixedWidth(s.station.name, 12) + " " + s.instrumentHeight);
-      out.Line("DKD " + FixedWidth(s.orientation.name, 12));
+      out.Line("TR " + FixedWidth(s.station.name, kNameWidth) + " " + s.instrumentHeight);
+      out.Line("DKD " + FixedWidth(s.orientation.name, kNameWidth));
     }
     if (!coordinates) {
       out.Line(survey.Record(point));

@@ -61,7 +61,7 @@ void AppendDetailRow(std::string& out, const Survey& survey, const ComputedPoint
   const double zenith = PackedDegrees(Val(f[3]));
   out.push_back('|');
   std::size_t from = out.size();
-  out.append(f[0].substr(0, 12));
+  out.append(f[0].substr(0, kNameWidth));
   PadBehind(out, from, 5);
   out.append(" |");
   from = out.size();
@@ -81,13 +81,13 @@ void AppendDetailRow(std::string& out, const Survey& survey, const ComputedPoint
   // The note: the words of a record with them, or of a reading of 0.
   from = out.size();
   if (fields == 5) {
-    out.append(12, ' ');
+    out.append(kNameWidth, ' ');
   } else if (reading == 0 || point.words) {
     out.append(f[5]);
     if (fields == 7) out.append(" ").append(f[6]);
   }
-  out.resize(std::min(out.size(), from + 12));
-  PadBehind(out, from, 12);
+  out.resize(std::min(out.size(), from + kNameWidth));
+  PadBehind(out, from, kNameWidth);
   out.append(" |");
 }
 
@@ -95,7 +95,7 @@ void WriteStation(TextOut& out, const FormWords& w, const Survey& survey,
                   const StationResult& station, std::span<const ComputedPoint> points,
                   const std::array<std::string, 7>& nhap) {
   const SketchTexts& t = station.sketch;
-  const std::string orientation = FixedWidth(station.orientation.name, 12);
+  const std::string orientation = FixedWidth(station.orientation.name, kNameWidth);
   out.Line("");
   // Header text i cut to its width and set in its column.
   const auto field = [&nhap](std::size_t i) {
@@ -104,14 +104,14 @@ void WriteStation(TextOut& out, const FormWords& w, const Survey& survey,
   };
   out.Line(w.sketchNumber + field(1) + std::string(kSketchTitle));
   out.Line("");
-  out.Line(w.station + FixedWidth(station.station.name, 12) + w.area + field(0));
+  out.Line(w.station + FixedWidth(station.station.name, kNameWidth) + w.area + field(0));
   out.Line(w.instrument + field(2) + w.instrumentNumber + field(3));
   out.Line(w.surveyor + field(4) + w.recorder + field(5) + w.date + field(6));
   out.Line(w.stationCoordinates + NumberWidth(t.stationX, 11) +
            "    Y= " + NumberWidth(t.stationY, 10) + "    Z= " + NumberWidth(t.stationZ, 10));
   out.Line(w.orientation1 + orientation + " X= " + NumberWidth(t.orientationX, 11) + "    Y= " +
            NumberWidth(t.orientationY, 10) + "    Z= " + NumberWidth(t.orientationZ, 10));
-  out.Line(w.orientation2 + FixedWidth(t.checkName, 12) + " X= " + NumberWidth(t.checkX, 11) +
+  out.Line(w.orientation2 + FixedWidth(t.checkName, kNameWidth) + " X= " + NumberWidth(t.checkX, 11) +
            "    Y= " + NumberWidth(t.checkY, 10));
   out.Line(std::string(kFormWidth, '='));
   out.Line(w.columnHeads1);

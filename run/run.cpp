@@ -161,7 +161,7 @@ void ComputeStation(RunState& st, Host& host, WorkingCopy& copy, Counters& count
                       st.StXDinhHuong,
                       st.StYDinhHuong,
                       st.StZDinhHuong,
-                      std::string(12, ' '),
+                      std::string(kNameWidth, ' '),
                       {},
                       {},
                       0};
