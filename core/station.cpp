@@ -188,7 +188,7 @@ BodyRecord BodyRecordOf(std::span<const std::string_view> fields) {
   return code.size() > 2 && KTraCCG(code) == 1 ? BodyRecord::Peg : BodyRecord::Detail;
 }
 
-void STP5(RunState& st) {
+void ComputeDetailRecord(RunState& st) {
   ReportLongName(st, st.Field(0));
   const auto observation = UsableObservation(st);
   if (!observation) return;
@@ -205,7 +205,7 @@ void STP5(RunState& st) {
   NotePoint(st, PointKind::Detail, words, st.stp == 5 || words);
 }
 
-void STP6(RunState& st) {
+void ComputePegRecord(RunState& st) {
   st.TenKC = st.Field(5);
   if (st.TenKC == st.TenTram || st.TenKC == st.TenDinhHuong) {
     // An orientation distance record: only the distance counts. A shot
@@ -237,7 +237,7 @@ void STP6(RunState& st) {
   st.survey.controlListing.push_back({name, st.survey.points.size() - 1, {}, {}, {}, true});
 }
 
-void STP7(RunState& st) {
+void ComputeCheckRecord(RunState& st) {
   if (NumbersMissing(st, {1, 2})) return;
   st.TenKC = st.Field(5);
   SketchTexts& sketch = st.survey.stations.back().sketch;

@@ -54,8 +54,11 @@ bool ReadingTooLong(std::string_view reading);
 // station's block in the peg file. Only when the peg file is ticked.
 void CheckPegReadings(RunState& st, std::size_t firstPoint);
 
-void STP5(RunState& st);  // detail record
-void STP6(RunState& st);  // peg or orientation distance record
-void STP7(RunState& st);  // check record
+// The routines of a station's body records: a detail point radiated; a peg
+// radiated and made a known point, or an orientation distance checked; a
+// check sight on another known point.
+void ComputeDetailRecord(RunState& st);
+void ComputePegRecord(RunState& st);
+void ComputeCheckRecord(RunState& st);
 
 }  // namespace kavu

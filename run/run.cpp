@@ -113,13 +113,13 @@ void HandleBodyRecord(RunState& st) {
   const BodyRecord kind = BodyRecordOf(st.MangTruong);
   switch (kind) {
     case BodyRecord::Detail:
-      STP5(st);
+      ComputeDetailRecord(st);
       break;
     case BodyRecord::Peg:
-      STP6(st);
+      ComputePegRecord(st);
       break;
     case BodyRecord::Check:
-      STP7(st);
+      ComputeCheckRecord(st);
       break;
     case BodyRecord::TooFew:
     case BodyRecord::TooMany:
