@@ -2,28 +2,16 @@
 // command reads them, unsaved edits of the field book never computed unasked,
 // the summary that leads to the error report, a failed file that leaves the
 // recent list, and a window worked from the keyboard.
-#include <QAbstractButton>
-#include <QCheckBox>
-#include <QComboBox>
-#include <QDir>
-#include <QLabel>
-#include <QLineEdit>
 #include <QMessageBox>
-#include <QPlainTextEdit>
 #include <QProgressBar>
-#include <QPushButton>
 #include <QTextBrowser>
 #include <QtTest>
-#include <set>
 #include <sstream>
 
 #include "cli/cli.h"
 #include "core/messages.h"
 #include "core/typed_numbers.h"
 #include "support.h"
-#include "ui/editor.h"
-#include "ui/lists.h"
-#include "ui/mainwindow.h"
 #include "ui/nhapsdo.h"
 
 using namespace kavu;
@@ -31,13 +19,6 @@ using namespace kavu::ui;
 using namespace kavu::ui::test;
 
 namespace {
-
-// The example in the desk's folder, chosen as a click in the list chooses it.
-void ChooseExample(Desk& desk, const QByteArray& extra = {}) {
-  desk.write("job1.asc", ReadAll(QStringLiteral(KAVU_EXAMPLES "/job1.asc")) + extra);
-  QVERIFY(Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path()));
-  QVERIFY(desk.w.chooseFile(desk.path("job1.asc")));
-}
 
 int BatchExit(const std::vector<std::string>& args) {
   const std::vector<std::string_view> views(args.begin(), args.end());
@@ -68,15 +49,15 @@ class DayTest : public QObject {
       const char* box;  // the box refused, or none
     };
     const std::vector<Case> cases = {
-        {"1:500", "2,5", "3", nullptr},  {"1/2000", " 1.5 ", "2", nullptr},
+        {"1:500", "2,5", "3", nullptr},   {"1/2000", " 1.5 ", "2", nullptr},
         {"1:5OO", "2.0", "2", "TyleTXT"}, {"500", "2,5,0", "2", "Htxt"},
-        {"1.000", "2", "2", "TyleTXT"},  {"500", "0", "2", "Htxt"},
+        {"1.000", "2", "2", "TyleTXT"},   {"500", "0", "2", "Htxt"},
         {"500", "2", "hai", "txtSoleDC"},
     };
     for (const Case& c : cases) {
       Desk desk;
       desk.w.show();
-      ChooseExample(desk);
+      QVERIFY(desk.example());
       Child<QComboBox>(desk.w, "TyleTXT")->setCurrentText(QLatin1String(c.scale));
       Child<QLineEdit>(desk.w, "Htxt")->setText(QLatin1String(c.height));
       Child<QLineEdit>(desk.w, "txtSoleDC")->setText(QLatin1String(c.decimals));
@@ -85,23 +66,20 @@ class DayTest : public QObject {
       desk.w.tinh_Click();
       const std::string copy = desk.path("batch.asc").toStdString();
       QVERIFY(QFile::copy(desk.path("job1.asc"), Q(copy)));
-      const int exit = BatchExit(
-          {"--dxf", "--scale", c.scale, "--text-height", c.height, "--height-decimals", c.decimals, copy});
+      const int exit = BatchExit({"--dxf", "--scale", c.scale, "--text-height", c.height,
+                                  "--height-decimals", c.decimals, copy});
       QVERIFY(!desk.person.asked.empty());
       if (c.box != nullptr) {
         QCOMPARE(exit, kExitUsage);
         QCOMPARE(desk.person.asked.size(), std::size_t{1});
-        const QString wanted = Q(TypedRefusalMessage(ReadRunNumbers(c.scale, c.height, c.decimals)));
-        QCOMPARE(desk.person.asked.back().text, wanted);
-        QVERIFY(wanted.endsWith(QLatin1String(c.box == std::string("TyleTXT") ? c.scale
-                                              : c.box == std::string("Htxt")  ? c.height
-                                                                               : c.decimals)));
+        QCOMPARE(desk.person.asked.back().text,
+                 Q(TypedRefusalMessage(ReadRunNumbers(c.scale, c.height, c.decimals))));
+        // The box itself, or the text box of the scale's list box.
         QWidget* focused = desk.w.focusWidget();
         QVERIFY(focused != nullptr);
-        const bool inBox = focused->objectName() == QLatin1String(c.box) ||
-                           (focused->parent() != nullptr &&
-                            focused->parent()->objectName() == QLatin1String(c.box));
-        QVERIFY2(inBox, qPrintable(focused->objectName()));
+        QVERIFY2(focused->objectName() == QLatin1String(c.box) ||
+                     focused->parentWidget()->objectName() == QLatin1String(c.box),
+                 qPrintable(focused->objectName()));
         QStringList after = QDir(desk.work.path()).entryList(QDir::Files);
         after.removeAll(QStringLiteral("batch.asc"));
         QCOMPARE(after, before);
@@ -120,7 +98,7 @@ class DayTest : public QObject {
     for (const MsgAnswer answer : {MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}) {
       Desk desk;
       desk.w.show();
-      ChooseExample(desk);
+      QVERIFY(desk.example());
       desk.w.suasolieu_Click();
       QPlainTextEdit* text = desk.w.editor().txtsuasl();
       const QByteArray onDisk = desk.read("job1.asc");
@@ -146,7 +124,7 @@ class DayTest : public QObject {
     for (const bool errors : {true, false}) {
       Desk desk;
       desk.w.show();
-      ChooseExample(desk, errors ? QByteArray("P99 0901500\r\n") : QByteArray());
+      QVERIFY(desk.example(errors ? "P99 0901500\r\n" : ""));
       bool offered = false, runControlsShown = true;
       desk.w.asker().setHook([&](const Question& question) {
         desk.person.asked.push_back(question);
@@ -176,8 +154,7 @@ class DayTest : public QObject {
         // A double click on its line opens the field book at the record, selected.
         const QTextCursor at = report->document()->find(QStringLiteral("P99"));
         QVERIFY(!at.isNull());
-        QTest::mouseDClick(report->viewport(), Qt::LeftButton, {},
-                           report->cursorRect(at).center());
+        QTest::mouseDClick(report->viewport(), Qt::LeftButton, {}, report->cursorRect(at).center());
         QVERIFY(desk.w.editor().isVisible());
         QCOMPARE(desk.w.editor().txtsuasl()->textCursor().selectedText(),
                  QStringLiteral("P99 0901500"));
@@ -191,14 +168,14 @@ class DayTest : public QObject {
   void aFailedFileLeavesTheRecentList() {
     Desk desk;
     desk.w.show();
-    ChooseExample(desk);
+    QVERIFY(desk.example());
     desk.write("empty.asc", "");
     QVERIFY(desk.w.chooseFile(desk.path("empty.asc")));
-    QVERIFY(desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("empty.asc"))));
+    QVERIFY(desk.w.recentFiles().contains(Native(desk.path("empty.asc"))));
     desk.w.tinh_Click();
     QCOMPARE(desk.w.lastRun().outcome, RunOutcome::NotStarted);
-    QVERIFY(!desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("empty.asc"))));
-    QVERIFY(desk.w.recentFiles().contains(QDir::toNativeSeparators(desk.path("job1.asc"))));
+    QVERIFY(!desk.w.recentFiles().contains(Native(desk.path("empty.asc"))));
+    QVERIFY(desk.w.recentFiles().contains(Native(desk.path("job1.asc"))));
     QCOMPARE(desk.w.windowTitle(), Q(msg::kProgramTitle));
   }
 
@@ -214,8 +191,7 @@ class DayTest : public QObject {
     desk.w.tinh_Click();
     QCOMPARE(desk.w.lastRun().outcome, RunOutcome::Completed);
     QVERIFY(!desk.w.lastRun().unwritable.empty());
-    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(),
-             QDir::toNativeSeparators(desk.path("job.sdr")));
+    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), Native(desk.path("job.sdr")));
     QCOMPARE(desk.person.asked.back().icon, MsgIcon::Exclamation);
   }
 
@@ -224,7 +200,7 @@ class DayTest : public QObject {
   void cancellingTheWayOutKeepsTheMap() {
     Desk desk;
     desk.w.show();
-    ChooseExample(desk);
+    QVERIFY(desk.example());
     desk.write("other.asc", "TR A 1 2 3\r\n");
     desk.w.suasolieu_Click();
     desk.w.editor().openFile(desk.path("other.asc"), desk.path("other"), desk.work.path(),
@@ -243,24 +219,8 @@ class DayTest : public QObject {
   void theWindowWorksFromTheKeyboard() {
     Desk desk;
     desk.w.show();
-    std::set<QChar> keys;
-    for (QWidget* control : desk.w.findChildren<QWidget*>()) {
-      QString text;
-      if (auto* button = qobject_cast<QAbstractButton*>(control)) text = button->text();
-      if (auto* label = qobject_cast<QLabel*>(control)) text = label->text();
-      const qsizetype at = text.indexOf(QLatin1Char('&'));
-      if (at >= 0 && at + 1 < text.size()) {
-        QVERIFY2(keys.insert(text[at + 1].toLower()).second, qPrintable(text));
-      }
-      const bool option = qobject_cast<QAbstractButton*>(control) != nullptr ||
-                          qobject_cast<QLineEdit*>(control) != nullptr ||
-                          qobject_cast<QComboBox*>(control) != nullptr;
-      if (option && !control->objectName().isEmpty() && control->parent() != nullptr &&
-          qobject_cast<QComboBox*>(control->parent()) == nullptr) {
-        QVERIFY2(!control->toolTip().isEmpty(), qPrintable(control->objectName()));
-      }
-    }
-    QVERIFY(keys.size() >= 15);
+    const QStringList faults = KeyboardFaults(desk.w, true);
+    QVERIFY2(faults.isEmpty(), qPrintable(faults.join(QLatin1Char('\n'))));
     // The map button comes before the exit button.
     QWidget* at = Child<QPushButton>(desk.w, "tinh");
     QStringList order;

@@ -1,20 +1,10 @@
 // The text windows as a surveyor uses them: the title marks unsaved edits; a
 // double click on a line of the run's error report opens the record it is
-// about, its whole line selected; Esc closes each window; replace all tells
-// how many it replaced; the header form counts the characters of its boxes
-// and the sketch prints what it shows; every button has a tip and an access
-// key of its own.
-#include "ui/editor.h"
-
-#include <QCheckBox>
-#include <QDir>
-#include <QLabel>
-#include <QLineEdit>
-#include <QPlainTextEdit>
-#include <QPushButton>
+// about, its whole line selected; Esc closes each window; the header form
+// counts the characters of its boxes and the sketch prints what it shows;
+// every button has a tip and an access key of its own.
 #include <QTextBlock>
 #include <QtTest>
-#include <set>
 #include <string_view>
 
 #include "core/host.h"
@@ -22,8 +12,6 @@
 #include "products/reports.h"
 #include "run/run.h"
 #include "support.h"
-#include "ui/lists.h"
-#include "ui/mainwindow.h"
 #include "ui/nhapsdo.h"
 #include "ui/timthay.h"
 
@@ -33,35 +21,6 @@ using namespace kavu::ui::test;
 
 namespace {
 
-QString Native(const QString& path) { return QDir::toNativeSeparators(path); }
-
-// The main window on a scratch folder holding files, one of them clicked in
-// the file list and opened in the editor.
-struct Editing : Desk {
-  Editing(std::initializer_list<std::pair<const char*, QByteArray>> files, const char* name) {
-    for (const auto& [file, bytes] : files) write(file, bytes);
-    w.SelectKind(9);  // the kind that lists every file
-    Child<FolderList>(w, "lsttm")->setPath(work.path());
-    click(name);
-    press(w, "suasolieu");
-  }
-  void click(const char* name) {
-    auto* list = Child<FileList>(w, "lstfile");
-    emit list->itemClicked(list->findItems(QLatin1String(name), Qt::MatchExactly).value(0));
-  }
-  void press(QWidget& window, const char* button) { Child<QPushButton>(window, button)->click(); }
-  // The viewer opened from the editor on a file of the folder.
-  void view(const char* name) {
-    w.editor().setChooser([this, name](const QString&, const QString&) { return path(name); });
-    press(w.editor(), "xemfile");
-  }
-};
-
-void DoubleClickLine(QPlainTextEdit* box, int block) {
-  const QTextCursor at(box->document()->findBlockByNumber(block));
-  QTest::mouseDClick(box->viewport(), Qt::LeftButton, {}, box->cursorRect(at).center());
-}
-
 int BlockStarting(const QPlainTextEdit* box, const char* lead) {
   for (QTextBlock b = box->document()->firstBlock(); b.isValid(); b = b.next()) {
     if (b.text().startsWith(QLatin1String(lead))) return b.blockNumber();
@@ -70,10 +29,10 @@ int BlockStarting(const QPlainTextEdit* box, const char* lead) {
 }
 
 // A station on KC1 whose orientation distance to KC2 is 6 cm off (line 5),
-// and a detail point that happens to be named KC1 (line 7).
+// and a detail point that happens to be named KC1 (line 7, a tab after it).
 const QByteArray kBook =
     "TR KC1 1000 1000 10\r\nTR KC2 900 1000 12\r\nTR KC1 1.5\r\nDKD KC2\r\n"
-    "X1 0 100.06 900000 1.5 KC2\r\nP1 900000 10 900000 1.5\r\nKC1 1800000 10 900000 1.5\r\n";
+    "X1 0 100.06 900000 1.5 KC2\r\nP1 900000 10 900000 1.5\r\nKC1\t1800000 10 900000 1.5\r\n";
 
 // The run of the book in the desk's folder: the field-book line of each line
 // of the error report it writes beside it.
@@ -82,21 +41,7 @@ std::vector<std::uint32_t> RunBook(const Desk& desk) {
   st.txtfile = desk.path("job.asc").toStdString();
   st.seed = 1;
   QuietHost host;
-  const RunResult run = tinh_Click(st, host);
-  return ErrorReportBookLines(run.survey);
-}
-
-// The letters of the access keys (&) of a window's buttons, check boxes and
-// labels; "" for a control without one.
-std::vector<QString> AccessKeys(QWidget& window) {
-  std::vector<QString> keys;
-  for (const auto* button : window.findChildren<QAbstractButton*>()) {
-    keys.push_back(QKeySequence::mnemonic(button->text()).toString());
-  }
-  for (const auto* label : window.findChildren<QLabel*>()) {
-    if (label->buddy() != nullptr) keys.push_back(QKeySequence::mnemonic(label->text()).toString());
-  }
-  return keys;
+  return ErrorReportBookLines(tinh_Click(st, host).survey);
 }
 
 }  // namespace
@@ -115,9 +60,7 @@ class EditorTest : public QObject {
   void theTitleMarksUnsavedEdits() {
     for (const bool viewer : {false, true}) {
       Editing desk({{"job1.asc", "TR K1 1.5\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
-      if (viewer) desk.view("job1.err");
-      TextWindow& window = viewer ? static_cast<TextWindow&>(desk.w.viewer())
-                                  : static_cast<TextWindow&>(desk.w.editor());
+      TextWindow& window = desk.window(viewer, "job1.err");
       auto* box = window.findChild<QPlainTextEdit*>();
       const QString name = Native(desk.path(viewer ? "job1.err" : "job1.asc"));
       const QString caption = Q(viewer ? kMoreAboutFile : kDataOfFile);
@@ -178,7 +121,9 @@ class EditorTest : public QObject {
       }
       const int tram = BlockStarting(text, "Tram KC1");
       QVERIFY2(tram > 0, qPrintable(text->toPlainText()));
-      DoubleClickLine(text, tram);
+      QTest::mouseDClick(
+          text->viewport(), Qt::LeftButton, {},
+          text->cursorRect(QTextCursor(text->document()->findBlockByNumber(tram))).center());
       QPlainTextEdit* book = desk.w.editor().txtsuasl();
       const QString what = QString::number(c.how);
       QVERIFY2(desk.w.editor().file() == Native(desk.path("job.asc")), qPrintable(what));
@@ -189,13 +134,14 @@ class EditorTest : public QObject {
     }
   }
 
-  // Esc closes the editor, the viewer, the find window and the header form
-  // (opened as a button of the main window opens it); the form keeps its
-  // texts.
+  // Esc closes the editor, the viewer, the find window, the help and the
+  // header form (opened as a button of the main window opens it); the form
+  // keeps its texts.
   void escClosesEachWindow() {
     Editing desk({{"job1.asc", "TR K1 1.5\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
     desk.view("job1.err");
     desk.press(desk.w.viewer(), "Timxem");
+    desk.w.trogiup_Click();
     desk.w.headerForm().showForm();
     auto* surveyor = Child<QLineEdit>(desk.w.headerForm(), "nhap5");
     surveyor->setText(Q("Lê Văn Tám"));
@@ -203,6 +149,7 @@ class EditorTest : public QObject {
         {&desk.w.finder(), Child<QLineEdit>(desk.w.finder(), "txttim")},
         {&desk.w.viewer(), desk.w.viewer().txtxem()},
         {&desk.w.editor(), desk.w.editor().txtsuasl()},
+        {desk.w.helpWindow(), desk.w.helpWindow()},
         {&desk.w.headerForm(), surveyor},
     };
     for (const auto& [window, focus] : windows) QVERIFY(window->isVisible());
@@ -210,43 +157,11 @@ class EditorTest : public QObject {
       QTest::keyClick(focus, Qt::Key_Escape);
       QVERIFY2(!window->isVisible(), qPrintable(window->objectName()));
     }
-    QVERIFY(desk.person.asked.empty());
+    QVERIFY(desk.person.asked.empty() && !desk.ended);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::DeferredDelete);
     QVERIFY(!desk.w.headerFormLoaded());
     QCOMPARE(Stored("NhapSDO5"), Q("Lê Văn Tám"));
     QCOMPARE(Child<QLineEdit>(desk.w.headerForm(), "nhap5")->text(), Q("Lê Văn Tám"));
-  }
-
-  void replaceAllSaysHowMany() {
-    const struct {
-      const char *text, *needle;
-      int caret;
-      const char *result, *told;
-    } cases[] = {
-        {"a-a-a", "a", 0, "X-X-X", "Đã thay 3 chỗ."},
-        {"Đường ĐƯỜNG", "đường", 0, "X X", "Đã thay 2 chỗ."},
-        {"abc abc", "abc", 5, "abc abc", "Không tìm thấy chỗ nào để thay."},
-    };
-    for (const auto& c : cases) {
-      Person person;
-      Asker ask;
-      ask.setHook(person.hook());
-      QPlainTextEdit text;
-      Timthay find(ask, [&text](int) { return &text; });
-      text.setPlainText(Q(c.text));
-      QTextCursor cursor = text.textCursor();
-      cursor.setPosition(c.caret);
-      text.setTextCursor(cursor);
-      find.open(1);
-      Child<QLineEdit>(find, "txttim")->setText(Q(c.needle));
-      Child<QLineEdit>(find, "txtthay")->setText(QStringLiteral("X"));
-      Child<QPushButton>(find, "thay2")->click();
-      QCOMPARE(text.toPlainText(), Q(c.result));
-      QCOMPARE(person.asked.size(), std::size_t{1});
-      QCOMPARE(person.asked[0].text, Q(c.told));
-      QCOMPARE(person.asked[0].icon, MsgIcon::Information);
-      QVERIFY(find.isVisible());
-    }
   }
 
   // Each box shows its characters of its most as typed, a letter with its
@@ -255,35 +170,34 @@ class EditorTest : public QObject {
   // label that follows one.
   void theHeaderFormCountsWhatTheSketchPrints() {
     Desk desk;
-    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), desk.path("job1.asc")));
-    Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path());
+    QVERIFY(desk.example());
     Child<QCheckBox>(desk.w, "fsdo")->click();  // grayed -> ticked opens the form
     Nhapsdo& form = desk.w.headerForm();
     const struct {
       const char* box;
-      QString typed;
-      const char *holds, *count;
+      QString typed, holds;
+      const char* count;
     } cases[] = {
-        {"nhap5", Q("Nguyễn Văn An"), "Nguyễn Văn An", "13/16"},
-        {"nhap6", QStringLiteral("Tra\u0302\u0300n"), "Tra\u0302\u0300n", "4/17"},  // "Trần"
-        {"nhap7", Q("12/05/2004 sáng"), "12/05/2004", "10/10"},
-        {"nhap2", QString(), "", "0/6"},
-        {"nhap3", QString(50, QLatin1Char('z')), "zzzzzzzzzzzzzzzzzz", "18/18"},
-        {"nhap5", QString(50, QLatin1Char('x')), "xxxxxxxxxxxxxxxx", "16/16"},
-        {"nhap6", QString(50, QLatin1Char('y')), "yyyyyyyyyyyyyyyyy", "17/17"},
+        {"nhap5", Q("Nguyễn Văn An"), Q("Nguyễn Văn An"), "13/16"},
+        {"nhap6", Q("Tra\u0302\u0300n"), Q("Tra\u0302\u0300n"), "4/17"},  // "Trần"
+        {"nhap7", Q("12/05/2004 sáng"), Q("12/05/2004"), "10/10"},
+        {"nhap2", QString(), QString(), "0/6"},
+        {"nhap1", QString(50, 'w'), QString(39, 'w'), "39/39"},
+        {"nhap4", QString(50, 'v'), QString(20, 'v'), "20/20"},
+        {"nhap3", QString(50, 'z'), QString(18, 'z'), "18/18"},
+        {"nhap5", QString(50, 'x'), QString(16, 'x'), "16/16"},
+        {"nhap6", QString(50, 'y'), QString(17, 'y'), "17/17"},
     };
     for (const auto& c : cases) {
       auto* box = Child<QLineEdit>(form, c.box);
       box->clear();
       for (const QChar typed : c.typed) box->insert(typed);  // a key at a time
-      QCOMPARE(box->text(), QString::fromUtf8(c.holds));
+      QCOMPARE(box->text(), c.holds);
       const QString count = QStringLiteral("dem") + QLatin1String(c.box).mid(4);
       QCOMPARE(Child<QLabel>(form, qPrintable(count))->text(), QLatin1String(c.count));
     }
-    Child<QPushButton>(form, "nhap")->click();
-    auto* list = Child<FileList>(desk.w, "lstfile");
-    emit list->itemClicked(list->findItems(QStringLiteral("job1.asc"), Qt::MatchExactly).value(0));
-    Child<QPushButton>(desk.w, "tinh")->click();
+    desk.press(form, "nhap");
+    desk.press(desk.w, "tinh");
     const QByteArray sketch = desk.read("job1.sdo");
     for (const char* line :
          {"1. Máy đo: zzzzzzzzzzzzzzzzzz Số máy: ",
@@ -296,19 +210,10 @@ class EditorTest : public QObject {
   // share a key.
   void everyButtonHasATipAndAKeyOfItsOwn() {
     Editing desk({{"job1.asc", "TR K1 1.5\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
-    QWidget* windows[] = {&desk.w.editor(), &desk.w.viewer(), &desk.w.finder(),
-                          &desk.w.headerForm()};
-    for (QWidget* window : windows) {
-      for (const auto* button : window->findChildren<QPushButton*>()) {
-        const QString what = window->objectName() + "/" + button->objectName();
-        QVERIFY2(!button->toolTip().isEmpty(), qPrintable(what));
-        QVERIFY2(!QKeySequence::mnemonic(button->text()).isEmpty(), qPrintable(what));
-      }
-      std::set<QString> seen;
-      for (const QString& key : AccessKeys(*window)) {
-        QVERIFY2(key.isEmpty() || seen.insert(key).second,
-                 qPrintable(window->objectName() + " " + key));
-      }
+    for (QWidget* window : std::initializer_list<QWidget*>{
+             &desk.w.editor(), &desk.w.viewer(), &desk.w.finder(), &desk.w.headerForm()}) {
+      const QStringList faults = KeyboardFaults(*window);
+      QVERIFY2(faults.isEmpty(), qPrintable(faults.join(QLatin1Char('\n'))));
     }
   }
 };

@@ -1,30 +1,22 @@
 // The windows driven as a surveyor would: the settings kept between sessions,
-// the header form, choosing a file in the lists, computing it to the summary,
-// a run stopped underway; the data editor and the viewer, TCVN3 files shown in
-// Unicode and saved back byte for byte with their backups, unsaved edits never
-// dropped unasked; the find and replace steps.
+// choosing a file in the lists, computing it to the summary, a run stopped
+// underway; the data editor and the viewer, TCVN3 files shown in Unicode and
+// saved back byte for byte with their backups, unsaved edits never dropped
+// unasked; the find and replace steps.
 #include <QCheckBox>
 #include <QComboBox>
-#include <QDir>
 #include <QFileDialog>
 #include <QLineEdit>
 #include <QMessageBox>
 #include <QMimeData>
 #include <QPlainTextEdit>
-#include <QPushButton>
-#include <QTextBlock>
 #include <QtTest>
 #include <tuple>
 
 #include "core/messages.h"
-#include "core/tcvn3.h"
 #include "support.h"
 #include "tests/generated_book.h"
 #include "ui/dialog.h"
-#include "ui/editor.h"
-#include "ui/lists.h"
-#include "ui/mainwindow.h"
-#include "ui/nhapsdo.h"
 #include "ui/openfile.h"
 #include "ui/runthread.h"
 #include "ui/timthay.h"
@@ -35,8 +27,6 @@ using namespace kavu::ui::test;
 
 namespace {
 
-QString Native(const QString& path) { return QDir::toNativeSeparators(path); }
-
 // Clicks (or double-clicks) a file of the file list as the mouse would.
 void ClickFile(MainWindow& w, const char* name, bool twice = false) {
   auto* list = Child<FileList>(w, "lstfile");
@@ -44,40 +34,6 @@ void ClickFile(MainWindow& w, const char* name, bool twice = false) {
   QTest::mouseClick(list->viewport(), Qt::LeftButton, {}, at);
   if (twice) QTest::mouseDClick(list->viewport(), Qt::LeftButton, {}, at);
 }
-
-// The example field book in the desk's folder, shown in the lists.
-bool ShowExample(Desk& desk) {
-  return QFile::copy(QStringLiteral(KAVU_EXAMPLES "/job1.asc"), desk.path("job1.asc")) &&
-         Child<FolderList>(desk.w, "lsttm")->setPath(desk.work.path());
-}
-
-// The main window with the files of its folder listed as the kind asks, a
-// file clicked and the editor opened on it.
-struct Editing : Desk {
-  Editing(std::initializer_list<std::pair<const char*, QByteArray>> files, const char* name,
-          int kind = 0) {
-    for (const auto& [file, bytes] : files) write(file, bytes);
-    w.SelectKind(kind);
-    Child<FolderList>(w, "lsttm")->setPath(work.path());
-    click(name);
-    press(w, "suasolieu");
-  }
-  void click(const char* name) {
-    auto* list = Child<FileList>(w, "lstfile");
-    emit list->itemClicked(list->findItems(QLatin1String(name), Qt::MatchExactly).value(0));
-  }
-  void press(QWidget& window, const char* button) { Child<QPushButton>(window, button)->click(); }
-  // The editor's text replaced and saved.
-  void save(const QString& text) {
-    w.editor().txtsuasl()->setPlainText(text);
-    press(w.editor(), "ghi");
-  }
-  // The viewer opened from the editor on a file of the folder.
-  void view(const char* name) {
-    w.editor().setChooser([this, name](const QString&, const QString&) { return path(name); });
-    press(w.editor(), "xemfile");
-  }
-};
 
 // A find window on one text box, the given text selected, answered by a
 // person; presses its buttons in turn: f "Tìm tiếp", r "Thay thế", a "Thay
@@ -157,10 +113,8 @@ class WindowTest : public QObject {
     }
     QCOMPARE(Child<FileList>(again, "lstfile")->pattern(), QStringLiteral("*.idx"));
     // The folder label keeps the last 24 characters.
-    QCOMPARE(ShortFolderText(QStringLiteral("/home/surveyor/data/2024")),
-             "/home/surveyor/data/2024");
-    QCOMPARE(ShortFolderText(QStringLiteral("/home/surveyor/data/2024x")),
-             "...home/surveyor/data/2024x");
+    for (const QString path : {"/home/surveyor/data/2024", "/home/surveyor/data/2024x"})
+      QCOMPARE(ShortFolderText(path), (path.size() < 25 ? "" : "...") + path.right(24));
   }
 
   // However the list's current file changes, it is the chosen file, and it
@@ -198,37 +152,23 @@ class WindowTest : public QObject {
     QCOMPARE(QDir(survey).count(), 5u);
   }
 
-  // The header form: typed text stops at the field's width, the texts are
-  // stored and the sketch takes them. A double click computes to the summary;
-  // a run is not closed underway and its stop button writes nothing; no to
-  // "continue?" ends the program.
-  void theHeaderFormAComputeAndAStoppedRun() {
-    const std::array<int, 7> widths = {39, 6, 18, 20, 16, 17, 10};
+  // A double click computes to the summary; a run is not closed underway
+  // and its stop button writes nothing; no to "continue?" ends the program.
+  void aComputeAndAStoppedRun() {
     Desk desk;
     MainWindow& w = desk.w;
     w.show();
-    QVERIFY(ShowExample(desk));
-    Child<QCheckBox>(w, "fsdo")->click();  // grayed -> ticked opens the form
-    for (int i = 0; i < 7; ++i) {
-      auto* box = w.headerForm().findChild<QLineEdit*>(QStringLiteral("nhap%1").arg(i + 1));
-      box->clear();
-      QTest::keyClicks(box, QString(50, QLatin1Char('x')));
-      QCOMPARE(box->text().size(), widths[static_cast<std::size_t>(i)]);
-    }
-    Child<QLineEdit>(w.headerForm(), "nhap5")->setText(Q("Lê Thị Hoa"));
-    QTest::keyClick(Child<QLineEdit>(w.headerForm(), "nhap5"), Qt::Key_Return);
-    QCOMPARE(Stored("NhapSDO5"), Q("Lê Thị Hoa"));
+    QVERIFY(desk.example());
     ClickFile(w, "job1.asc", true);
     const QString summary = desk.person.asked.at(0).text;
     QVERIFY(summary.startsWith(Q(msg::kTotalStations) + " 4\r") &&
             summary.endsWith(Q(msg::kContinue)));
-    QVERIFY(desk.read("job1.sdo").contains(QByteArray::fromStdString(Utf8ToTcvn3("Lê Thị Hoa"))));
 
     // The same job grown large, so that the run is in its station loop when
     // the stop button is pressed.
     desk.write("job1.asc", QByteArray::fromStdString(testing::GeneratedFieldBook(400, 100)));
     const QStringList files = QDir(desk.work.path()).entryList(QDir::Files);
-    const QByteArray sketch = desk.read("job1.sdo");
+    const QByteArray points = desk.read("job1.td1");
     auto* stop = Child<QPushButton>(w, "dung");
     bool pressed = false;
     const auto underway = [&] {
@@ -246,7 +186,7 @@ class WindowTest : public QObject {
     QVERIFY(pressed && w.isVisible() && !desk.ended);
     QCOMPARE(desk.person.asked.back().text, Q(msg::kRunCancelled));  // in place of the summary
     QCOMPARE(QDir(desk.work.path()).entryList(QDir::Files), files);
-    QCOMPARE(desk.read("job1.sdo"), sketch);
+    QCOMPARE(desk.read("job1.td1"), points);
 
     desk.write("job1.asc", ReadAll(QStringLiteral(KAVU_EXAMPLES "/job1.asc")));
     desk.person.answers = {MsgAnswer::No};
@@ -290,7 +230,7 @@ class WindowTest : public QObject {
   // A backup opened in the editor keeps its old content; a save that cannot
   // be made (its scratch name taken by a folder) leaves the files.
   void backupsOfBackupsAndSavesThatCannotBeMade() {
-    Editing desk({{"job1.bak", "old\r\n"}}, "job1.bak", 9);  // the kind that lists every file
+    Editing desk({{"job1.bak", "old\r\n"}}, "job1.bak");
     desk.save(QStringLiteral("new"));
     QCOMPARE(desk.read("job1.bak"), QByteArray("new\r\n"));
     QCOMPARE(desk.read("job1.bak.bak"), QByteArray("old\r\n"));
@@ -310,9 +250,7 @@ class WindowTest : public QObject {
       const int way = k / 3 % 4;
       const MsgAnswer answer = std::array{MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}[k % 3];
       Editing desk({{"job1.asc", "book\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
-      if (viewer) desk.view("job1.err");
-      TextWindow& window = viewer ? static_cast<TextWindow&>(desk.w.viewer())
-                                  : static_cast<TextWindow&>(desk.w.editor());
+      TextWindow& window = desk.window(viewer, "job1.err");
       const char* name = viewer ? "job1.err" : "job1.asc";
       window.findChild<QPlainTextEdit*>()->appendPlainText(QStringLiteral("edited"));
       desk.person.answers = {answer};
@@ -322,26 +260,12 @@ class WindowTest : public QObject {
       if (way == 1) desk.press(window, "thoat");
       if (way == 2) window.close();
       if (way == 3) desk.press(desk.w, "thoat");
-      const QString question = Q(kSaveChanges) + QDir::toNativeSeparators(desk.path(name)) + "?";
+      const QString question = Q(kSaveChanges) + Native(desk.path(name)) + "?";
       QVERIFY2(!desk.person.asked.empty() && desk.person.asked.back().text == question, what);
       const bool stays = answer == MsgAnswer::Cancel;
       QVERIFY2(window.isVisible() == stays && (way < 3 || desk.ended != stays), what);
       QVERIFY2((desk.read(name) == before) != (answer == MsgAnswer::Yes), what);
     }
-  }
-
-  void aReportLineOpensTheFieldBookAtItsPoint() {
-    Editing desk(
-        {{"job1.asc", "TR K1 1.5\r\nDKD K2\r\nP1 0 1 0900000 1.5\r\nP2\t10 1 0900000 1.5\r\n"},
-         {"job1.err", "\r\nDiem P2 nhap sai phan do\r\n"},
-         {"other.asc", "x\r\n"}},
-        "other.asc");
-    desk.view("job1.err");
-    QPlainTextEdit* report = desk.w.viewer().txtxem();
-    const QRect line = report->cursorRect(QTextCursor(report->document()->findBlockByNumber(1)));
-    QTest::mouseDClick(report->viewport(), Qt::LeftButton, {}, line.center());
-    QCOMPARE(desk.w.editor().file(), QDir::toNativeSeparators(desk.path("job1.asc")));
-    QCOMPARE(desk.w.editor().txtsuasl()->textCursor().blockNumber(), 3);
   }
 
   // Ctrl+F opens the find window on the editor, F3 finds on, Ctrl+S saves; the
@@ -382,13 +306,14 @@ class WindowTest : public QObject {
   // A find step searches from one past the start of the selection; replace
   // works on the match the user sees, then shows the next; replace all on
   // every match from the caret on, in one step of undo, the caret behind the
-  // last. Not found, Yes to "find on?" goes back to the top.
+  // last, and tells how many. Not found, Yes to "find on?" goes back to the top.
   void findAndReplace() {
     struct Case {
       const char *text, *needle;
       int start, length;  // the selection before
       const char *presses, *result;
-      int selStart, selLength;  // the selection after
+      int selStart, selLength;     // the selection after
+      const char* told = nullptr;  // the message shown
       const char* with = "X";
     };
     for (const Case& c : {
@@ -401,14 +326,21 @@ class WindowTest : public QObject {
              Case{"a-a-a", "a", 0, 0, "rr", "X-a-a", 2, 1},
              Case{"abc abc", "abc", 0, 0, "fr", "abc X", 5, 0},
              Case{"abc abc", "abc", 1, 2, "r", "abc abc", 4, 3},  // no match selected
-             Case{"aab", "a", 0, 1, "r", "ab", 0, 1, ""},
-             Case{"a-a-a", "a", 2, 1, "a", "a-X-X", 5, 0},
-             Case{"x ABC abc", "abc", 0, 0, "a", "x X X", 5, 0},
+             Case{"aab", "a", 0, 1, "r", "ab", 0, 1, nullptr, ""},
+             Case{"a-a-a", "a", 2, 1, "a", "a-X-X", 5, 0, "Đã thay 2 chỗ."},
+             Case{"a-a-a", "a", 0, 0, "a", "X-X-X", 5, 0, "Đã thay 3 chỗ."},
+             Case{"Đường ĐƯỜNG", "đường", 0, 0, "a", "X X", 3, 0, "Đã thay 2 chỗ."},
+             Case{"abc abc", "abc", 5, 0, "a", "abc abc", 5, 0, "Không tìm thấy chỗ nào để thay."},
          }) {
       Bench bench(c.text, c.needle, c.start, c.length, c.presses, c.with);
       QCOMPARE(bench.text.toPlainText(), Q(c.result));
       QCOMPARE(bench.selStart(), c.selStart);
       QCOMPARE(bench.selLength(), c.selLength);
+      if (c.told != nullptr) {
+        QCOMPARE(bench.person.asked.size(), std::size_t{1});
+        QCOMPARE(bench.person.asked[0].text, Q(c.told));
+        QVERIFY(bench.find.isVisible());
+      }
     }
     Bench all("aa-a", "a", 0, 0, "a", "bb");
     QCOMPARE(all.text.toPlainText(), QStringLiteral("bbbb-bb"));
