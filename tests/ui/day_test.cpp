@@ -192,7 +192,14 @@ class DayTest : public QObject {
     QCOMPARE(desk.w.lastRun().outcome, RunOutcome::Completed);
     QVERIFY(!desk.w.lastRun().unwritable.empty());
     QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), Native(desk.path("job.sdr")));
-    QCOMPARE(desk.person.asked.back().icon, MsgIcon::Exclamation);
+    // The summary names it with its reason under a warning, and no error
+    // report, since the run found no error.
+    const Question& summary = desk.person.asked.back();
+    QCOMPARE(summary.icon, MsgIcon::Exclamation);
+    QVERIFY2(summary.text.contains(Q(msg::kCannotWrite) + Native(desk.path("job.asc")) + " (" +
+                                   Q(msg::kIsAFolder) + ")") &&
+                 !summary.text.contains(QLatin1String(".err")),
+             qPrintable(summary.text));
   }
 
   // No to "continue?" and Hủy to saving the editor's edits: the program stays
