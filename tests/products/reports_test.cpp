@@ -8,7 +8,7 @@
 #include <vector>
 
 #include "core/host.h"
-#include "core/text.h"
+#include "core/lines.h"
 #include "run/run.h"
 #include "support.h"
 
@@ -16,22 +16,6 @@ namespace kavu {
 namespace {
 
 namespace fs = std::filesystem;
-
-// The lines of a text as a text window shows them: CR LF, a lone CR and a
-// lone LF each end one.
-std::vector<std::string> ScreenLines(const std::string& text) {
-  std::vector<std::string> lines(1);
-  for (std::size_t i = 0; i < text.size(); ++i) {
-    if (text[i] == '\r' || text[i] == '\n') {
-      if (text[i] == '\r' && i + 1 < text.size() && text[i + 1] == '\n') ++i;
-      lines.emplace_back();
-    } else {
-      lines.back().push_back(text[i]);
-    }
-  }
-  if (lines.back().empty()) lines.pop_back();  // the last line's end
-  return lines;
-}
 
 std::string ErrorReport(const Survey& survey) {
   TextOut out;
@@ -52,7 +36,7 @@ TEST(ErrorReportBookLines, OneForEachLineOfTheReport) {
   const std::string report = ErrorReport(survey);
   const std::vector<std::uint32_t> expected = {0, 0, 0, 5, 9, 0, 12, 12, 0, 0, 0, 0, 0, 40};
   EXPECT_EQ(ErrorReportBookLines(survey), expected);
-  EXPECT_EQ(ScreenLines(report).size(), expected.size()) << report;
+  EXPECT_EQ(SplitLines(report).size(), expected.size()) << report;
   EXPECT_EQ(ErrorReportBookLines(Survey{}), (std::vector<std::uint32_t>{0, 0}));
 }
 
@@ -69,8 +53,8 @@ TEST(ErrorReportBookLines, EveryLineOfARunsReportLeadsToItsRecord) {
   testing::RecordingHost host;
   const RunResult run = tinh_Click(st, host);
   ASSERT_EQ(run.outcome, RunOutcome::Completed);
-  const std::vector<std::string> report = ScreenLines(testing::FileBytes(folder / "job.err"));
-  const std::vector<std::string> records = ScreenLines(testing::FileBytes(book));
+  const std::vector<std::string> report = SplitLines(testing::FileBytes(folder / "job.err"));
+  const std::vector<std::string> records = SplitLines(testing::FileBytes(book));
   const std::vector<std::uint32_t> lines = ErrorReportBookLines(run.survey);
   ASSERT_EQ(lines.size(), report.size());
   EXPECT_EQ(ErrorReport(run.survey), testing::FileBytes(folder / "job.err"));
