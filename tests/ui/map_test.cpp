@@ -55,7 +55,6 @@ Survey HandMade() {
   return s;
 }
 
-QColor PixelAt(const QImage& image, QPointF at) { return image.pixelColor(at.toPoint()); }
 bool Red(const QColor& c) { return c.red() > 180 && c.green() < 80 && c.blue() < 80; }
 const QString kPng = QStringLiteral("Hình PNG (*.png)"), kSvg = QStringLiteral("Hình SVG (*.svg)"),
               kPdf = QStringLiteral("File PDF (*.pdf)");
@@ -122,8 +121,12 @@ class MapTest : public QObject {
  private slots:
   void init() { UseScratchSettings(store_); }
 
-  void oneItemPerPointAtItsPlaceWithTheRightHighlight() {
-    const MapModel model = BuildMap(HandMade());
+  // One item per point at its place, north up and east right at one scale;
+  // the wheel zooms around the cursor; the pictures red where the report
+  // points, black elsewhere, and a folder that is not there refused.
+  void theDrawingAndItsPictures() {
+    Shown shown(HandMade());
+    const MapModel& model = shown.canvas().model();
     QStringList items;  // kind name x y red
     for (const MapItem& i : model.items) {
       items << QStringList{QString::number(static_cast<int>(i.kind)), i.name, QString::number(i.x),
@@ -134,19 +137,12 @@ class MapTest : public QObject {
                                  "1 A 1000 2000 0", "3 1 1010 2010 0", "3 2 1020 1990 1",
                                  "2 CPđ 990 2030 1", "3 3 1040 2050 0"}));
     QCOMPARE(model.sights.size(), 2u);  // orientation and check sight
-
-    // North up, east right, one scale: B is above A, C right of A, as far.
-    const MapView view = FitView(model, QSize(400, 400));
-    const QPointF a = view.toDevice(1000, 2000), b = view.toDevice(1100, 2000),
-                  c = view.toDevice(1000, 2100);
-    QCOMPARE(b.x(), a.x());
-    QVERIFY(b.y() < a.y());
-    QCOMPARE(c.y(), a.y());
+    const MapView whole = FitView(model, kWholeSurveySize);
+    const QPointF a = whole.toDevice(1000, 2000), b = whole.toDevice(1100, 2000),
+                  c = whole.toDevice(1000, 2100);
+    QVERIFY(b.x() == a.x() && b.y() < a.y() && c.y() == a.y());
     QCOMPARE(c.x() - a.x(), a.y() - b.y());
-  }
 
-  void wheelZoomKeepsThePointUnderTheCursor() {
-    Shown shown(HandMade());
     MapCanvas& canvas = shown.canvas();
     const QPointF at = canvas.view().toDevice(1020, 1990) + QPointF(30, 20);
     const QPointF ground = canvas.view().toGround(at);
@@ -154,23 +150,17 @@ class MapTest : public QObject {
     QWheelEvent wheel(at, canvas.mapToGlobal(at), {}, {0, 240}, Qt::NoButton, Qt::NoModifier,
                       Qt::NoScrollPhase, false);
     QCoreApplication::sendEvent(&canvas, &wheel);
-    QVERIFY(canvas.view().scale > scale);
     const QPointF still = canvas.view().toGround(at);
-    QVERIFY(std::abs(still.x() - ground.x()) < 1e-6 && std::abs(still.y() - ground.y()) < 1e-6);
-  }
+    QVERIFY(canvas.view().scale > scale && std::abs(still.x() - ground.x()) < 1e-6 &&
+            std::abs(still.y() - ground.y()) < 1e-6);
 
-  // The view as PNG, the whole survey as PNG and SVG, red where the report
-  // points, black elsewhere; a folder that is not there is refused.
-  void exportsReadBack() {
-    Shown shown(HandMade());
-    const QString png = shown.path("view.png"), whole = shown.path("whole.png"),
-                  svg = shown.path("whole.svg");
-    QVERIFY(shown.map.savePicture(png, false) && shown.map.savePicture(whole, true) &&
+    const QString png = shown.path("view.png"), all = shown.path("all.png"),
+                  svg = shown.path("all.svg");
+    QVERIFY(shown.map.savePicture(png, false) && shown.map.savePicture(all, true) &&
             shown.map.savePicture(svg, true));
-    QCOMPARE(QImage(png).size(), shown.canvas().size());
-    const MapView view = FitView(shown.canvas().model(), kWholeSurveySize);
-    QVERIFY(Red(PixelAt(QImage(whole), view.toDevice(1020, 1990))));
-    const QColor plain = PixelAt(QImage(whole), view.toDevice(1040, 2050));
+    QCOMPARE(QImage(png).size(), canvas.size());
+    QVERIFY(Red(QImage(all).pixelColor(whole.toDevice(1020, 1990).toPoint())));
+    const QColor plain = QImage(all).pixelColor(whole.toDevice(1040, 2050).toPoint());
     QVERIFY(plain.lightness() < 60 && !Red(plain));
     QCOMPARE(QSvgRenderer(svg).viewBoxF(), QRectF(QPointF(0, 0), QSizeF(kWholeSurveySize)));
     QVERIFY(QString::fromUtf8(ReadAll(svg)).contains(QStringLiteral("CPđ")));
@@ -224,16 +214,47 @@ class MapTest : public QObject {
       QVERIFY2(shown.contains(QString::fromUtf8(words)), words);
   }
 
-  // A peg is a peg wherever the map names what a point is, also once a
-  // station stood on it (oriented to A); the point itself wins a click over
-  // its station.
-  void aPegIsNamedAPegEverywhere() {
-    const QString peg = QStringLiteral("CPđ");
+  // A click shows the point's own record and report lines, not those of a
+  // namesake at another station (detail numbers start again at each), the
+  // record whole on one line of a fixed-width font in a pane grown to show
+  // every line and resized with its splitter. A peg is a peg wherever the map
+  // names what a point is, also once a station stood on it; the point itself
+  // wins a click over its station.
+  void aClickDescribesThePoint() {
     Survey s = HandMade();
+    for (int i = 0; i < 6; ++i) s.AddReport("Diem 2            loi " + std::to_string(i), "2", 5);
+    s.AddPoint("2 0 1 900000 1", PointKind::Detail, 1060, 2060).line = 8;
+    s.AddReport("Diem 2            nhap sai phan do", "2", 8);
     const SurveyPoint on{std::string(s.Name(s.points[2])), s.points[2].x, s.points[2].y, {}};
     s.control.push_back(on);
     s.stations.push_back({on, s.control[0], 0, 10, std::nullopt, {}, 9});
-    Shown shown(std::move(s));
+    const QByteArray record = "2 0751234 10 900000 1.5 " + QByteArray(90, 'x');
+    Shown shown(std::move(s), "1\r\n2\r\n3\r\n4\r\n" + record + "\r\n6\r\n7\r\nsecond 2\r\n");
+    const auto describe = [&](double x, double y) {
+      const MapView& view = shown.canvas().view();
+      return shown.map.describe(ItemAt(shown.canvas().model(), view, view.toDevice(x, y)).value());
+    };
+    const QString first = describe(1020, 1990), second = describe(1060, 2060);
+    QVERIFY(first.contains("phan phut") && first.contains(record) && !first.contains("phan do") &&
+            !first.contains("second 2"));
+    QVERIFY(second.contains("phan do") && second.contains("second 2") &&
+            !second.contains("phan phut"));
+    auto* pane = Child<QTextBrowser>(shown.map, "chitiet");
+    QVERIFY(QFontInfo(pane->font()).fixedPitch());
+    shown.click(1020, 1990);
+    QCOMPARE(shown.map.details(), first);
+    // The point, the report heading and its 7 lines, the record heading and line.
+    QCOMPARE(pane->document()->blockCount(), 11);
+    for (QTextBlock b = pane->document()->begin(); b.isValid(); b = b.next()) {
+      QCOMPARE(b.layout()->lineCount(), 1);
+    }
+    QCOMPARE(pane->verticalScrollBar()->maximum(), 0);
+    auto* split = Child<QSplitter>(shown.map, "chia");
+    QVERIFY(!split->isCollapsible(0) && !split->isCollapsible(1));
+    split->setSizes({split->sizes()[0] + split->sizes()[1] - 200, 200});
+    QCOMPARE(pane->height(), 200);
+
+    const QString peg = QStringLiteral("CPđ");
     MapCanvas& canvas = shown.canvas();
     const MapModel& model = canvas.model();
     QStringList kinds;
@@ -247,9 +268,8 @@ class MapTest : public QObject {
     shown.click(model.items[item].x, model.items[item].y);
     QVERIFY(shown.map.details().startsWith(peg + QStringLiteral("  (Cọc phụ, Trạm máy)")));
     QVERIFY(shown.map.describe(0).startsWith(QStringLiteral("A  (Điểm khống chế, Trạm máy)")));
-    // The pane grew: the drawing fits the rest of the window.
-    const QPointF now = canvas.view().toDevice(model.items[item].x, model.items[item].y);
-    QHelpEvent help(QEvent::ToolTip, now.toPoint(), canvas.mapToGlobal(now.toPoint()));
+    const QPointF at = canvas.view().toDevice(model.items[item].x, model.items[item].y);
+    QHelpEvent help(QEvent::ToolTip, at.toPoint(), canvas.mapToGlobal(at.toPoint()));
     QCoreApplication::sendEvent(&canvas, &help);
     QCOMPARE(QToolTip::text(), peg + QStringLiteral(" (Cọc phụ), có báo lỗi"));
     QToolTip::hideText();
@@ -257,24 +277,10 @@ class MapTest : public QObject {
     for (std::string_view kind : kPointKinds) QVERIFY(legend.contains(Q(kind)));
     // Drawn as a square, not as a control point's triangle.
     QVERIFY(SaveMapSvg(model, canvas.view(), shown.path("peg.svg")));
-    const QString drawn = QString::fromUtf8(ReadAll(shown.path("peg.svg")));
-    QVERIFY(drawn.contains(QStringLiteral("<rect x=\"%1\" y=\"%2\" width=\"7\" height=\"7\"")
-                               .arg(now.x() - 3.5)
-                               .arg(now.y() - 3.5)));
-  }
-
-  // Detail numbers start again at each station: a click shows the point's
-  // own record and report lines, not those of its namesakes elsewhere.
-  void namesakesElsewhereAreOtherPoints() {
-    Survey s = HandMade();
-    s.AddPoint("2 0 1 900000 1", PointKind::Detail, 1060, 2060).line = 8;
-    s.AddReport("Diem 2            nhap sai phan do", "2", 8);
-    Shown shown(std::move(s), "1\r\n2\r\n3\r\n4\r\nfirst 2\r\n6\r\n7\r\nsecond 2\r\n");
-    const QString first = shown.map.describe(5), second = shown.map.describe(8);
-    QVERIFY(first.contains("phan phut") && first.contains("first 2"));
-    QVERIFY(!first.contains("phan do") && !first.contains("second 2"));
-    QVERIFY(second.contains("phan do") && second.contains("second 2"));
-    QVERIFY(!second.contains("phan phut") && !second.contains("first 2"));
+    QVERIFY(QString::fromUtf8(ReadAll(shown.path("peg.svg")))
+                .contains(QStringLiteral("<rect x=\"%1\" y=\"%2\" width=\"7\" height=\"7\"")
+                              .arg(at.x() - 3.5)
+                              .arg(at.y() - 3.5)));
   }
 
   void theJobsNameWithTheRightExtension() {
@@ -352,27 +358,20 @@ class MapTest : public QObject {
     QCOMPARE(press("zoomOut"), 1.0);
   }
 
-  // The pane shows a long record on one line of a fixed-width font, grows to
-  // show every line, and is resized with its splitter.
-  void theInformationPaneShowsEveryLineWhole() {
-    Survey s = HandMade();
-    for (int i = 0; i < 6; ++i) s.AddReport("Diem 2            loi " + std::to_string(i), "2", 5);
-    const QByteArray record = "2 0751234 10 900000 1.5 " + QByteArray(90, 'x');
-    Shown shown(std::move(s), "1\r\n2\r\n3\r\n4\r\n" + record + "\r\n");
-    auto* pane = Child<QTextBrowser>(shown.map, "chitiet");
-    QVERIFY(QFontInfo(pane->font()).fixedPitch());
-    shown.click(1020, 1990);
-    QVERIFY(shown.map.details().contains(QString::fromLatin1(record)));
-    // The point, the report heading and its 7 lines, the record heading and line.
-    QCOMPARE(pane->document()->blockCount(), 11);
-    for (QTextBlock b = pane->document()->begin(); b.isValid(); b = b.next()) {
-      QCOMPARE(b.layout()->lineCount(), 1);
-    }
-    QCOMPARE(pane->verticalScrollBar()->maximum(), 0);
-    auto* split = Child<QSplitter>(shown.map, "chia");
-    QVERIFY(!split->isCollapsible(0) && !split->isCollapsible(1));
-    split->setSizes({split->sizes()[0] + split->sizes()[1] - 200, 200});
-    QCOMPARE(pane->height(), 200);
+  // Esc closes the print preview, and then the map.
+  void escapeClosesTheWindows() {
+    Shown shown(HandMade(), {}, Sketch({{"A", 3}}));
+    bool closed = false;
+    const auto preview = WhenShown([&](QDialog& d) {
+      QTest::keyClick(&d, Qt::Key_Escape);
+      closed = !d.isVisible();
+    });
+    shown.action("printSketch")->trigger();
+    QVERIFY(*preview && closed && shown.map.isVisible());
+    shown.map.activateWindow();
+    QVERIFY(QTest::qWaitForWindowActive(&shown.map));
+    QTest::keyClick(&shown.canvas(), Qt::Key_Escape);
+    QVERIFY(!shown.map.isVisible());
   }
 
   void theWindowFitsTheScreen() {
@@ -396,22 +395,6 @@ class MapTest : public QObject {
     QVERIFY(available.contains(map.frameGeometry()));
     QVERIFY(
         available.contains(map.statusBar()->mapToGlobal(map.statusBar()->rect().bottomRight())));
-  }
-
-  // Esc closes the print preview, and then the map.
-  void escapeClosesTheWindows() {
-    Shown shown(HandMade(), {}, Sketch({{"A", 3}}));
-    bool closed = false;
-    const auto preview = WhenShown([&](QDialog& d) {
-      QTest::keyClick(&d, Qt::Key_Escape);
-      closed = !d.isVisible();
-    });
-    shown.action("printSketch")->trigger();
-    QVERIFY(*preview && closed && shown.map.isVisible());
-    shown.map.activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(&shown.map));
-    QTest::keyClick(&shown.canvas(), Qt::Key_Escape);
-    QVERIFY(!shown.map.isVisible());
   }
 
   // Every action says what it does and its keys; the menus show access keys,
