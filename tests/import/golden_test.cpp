@@ -13,53 +13,29 @@
 namespace kavu::testing {
 namespace {
 
-// codes.sdr holds every record code and the quirks: one name (the first
-// description) for the 08CO and 08KI of one id, a blank-padded id (DKC__12),
-// a coordinate record without X and Y (no control point), an observation
-// between a set-up and its backsight record (a block without orientation), a
-// point between the backsight record and the backsight itself, the backsight
-// found through its description, the backsight observed twice (one
-// orientation record), an empty 03NM, 8-decimal prism heights and "0.0"
-// before any, a station label from its description, and a set-up whose
-// backsight is never observed and has no circle reading (no orientation
-// record). .gre files (kind 7) use the same set-up codes.
+// codes.sdr: every record code and quirk (08CO and 08KI of one id, padded ids,
+// blocks without orientation, the backsight found through its description or
+// observed twice, prism heights before any); .gre files (kind 7) read alike.
 TEST(SdrConversion, MatchesHandCheckedBookByteForByte) {
   EXPECT_EQ(ConvertSdr(TestData("sdr/codes.sdr"), 1).book, TestData("sdr/codes.asc"));
   EXPECT_EQ(ConvertSdr(TestData("sdr/codes.sdr"), 7).book, TestData("sdr/codes.asc"));
 }
 
-// codes.obs: keyed-in points (coordinates as recorded, a nameless one
-// dropped), an 08CO and a set-up with coordinates that are control points
-// too, a point before its backsight (turned once the backsight is read), a
-// backsight name longer than its 10-character column, targets 0012 and P7
-// named as recorded, a blank distance, and a set-up whose backsight is never
-// observed and has no circle reading (no orientation record).
+// codes.obs: keyed-in and set-up points, a point before its backsight, a
+// backsight name over its column, a blank distance, a backsight never observed.
 TEST(ObsConversion, MatchesHandCheckedBookByteForByte) {
   EXPECT_EQ(ConvertObs(TestData("obs/codes.obs"), 2).book, TestData("obs/codes.asc"));
 }
 
-// codes.set: an observation before any set-up (skipped), two set-ups in a
-// row (the second counts), an orientation before any prism height ("0.0"), a
-// 9-character target (kept whole), an 8-decimal prism height, a set-up
-// without coordinates (no control point), an orientation coded like its
-// station (named by its identifier all the same), a line longer than 100
-// characters, and a set-up at the end with no observation; readings turned
-// to the orientation, once with the 360 wrap. Points are named by their
-// identifiers.
+// codes.set: observations before and set-ups without observations, an
+// orientation before any prism height, long targets and lines, the 360 wrap.
 TEST(SetConversion, MatchesHandCheckedBookByteForByte) {
   EXPECT_EQ(ConvertSet(TestData("set/codes.set")).book, TestData("set/codes.asc"));
 }
 
-// Checked by hand. Block S1: header lines before STN_ID skipped; height
-// "1.550;" -> ' 1.55 '; "A 1" -> A1; HA 0 -> '    00000'; Z 90 keeps SD;
-// prism -1.5 -> 1.5; face 2 (HA 45.5, Z 270) reduces to 225.5 and 90; an
-// 8-digit name is not cut; 359.99999 rounds to 0; 100 x sin 60 = 86.603;
-// prism "1.234567" gets a blank before it; a 3-field line is skipped; an
-// empty name and a distance "abc" still write a record; the line after END
-// SLOPE is ignored. Block "ST 1" (two blanks before it): label ST_1, height
-// .5. Block "STN_ID X": label X, "INST_HT;" keeps .5, no END SLOPE: the next
-// STN_ID starts block S3, which ends with the file (95 deg: 30 x sin 95 =
-// 29.886). Every block turns its readings so that its first shot reads 0.
+// quirks.idx: header lines, faces 1 and 2, heights and prisms as written,
+// names with blanks, blocks without END SLOPE; each block turned to its first
+// shot.
 TEST(ConvertIdx, GoldenEveryQuirk) {
   EXPECT_EQ(ConvertIdx(TestData("idx/quirks.idx")).book, TestData("idx/quirks.asc"));
 }
@@ -108,16 +84,9 @@ std::string Obs(std::string_view number, std::string_view deg, std::string_view 
   return line;
 }
 
-// Checked by hand. The header line is skipped though it looks like a set-up;
-// ST0 followed by ST1 is dropped; number 0 at 0 00 00 orients ST1 and its
-// column shows the recorded "0"; a 2-character description is dropped; a
-// blank zenith stays blank (the run reports the record), blank distance and
-// prism give "0.0"; 360 30 00 turns to
-// 0 30 00; a blank height gives "0.0"; two number-0 lines in a row: the first
-// is skipped, the second (0 00 02) orients; a reading of 0 00 04 orients a
-// point numbered 5, and 0 00 06 after it turns to 2"; 10 00 00 after an
-// orientation at 350 00 00 becomes 20 00 00; TCVN3 bytes and an inner blank
-// of a description pass through; a set-up as the last record is written.
+// quirks.tcm: the header line, set-ups in a row or last, number-0 lines that
+// orient, blank zenith, distance, prism and height, readings over 360 and
+// turned across 0, TCVN3 descriptions.
 TEST(ConvertTcm, GoldenEveryQuirk) {
   EXPECT_EQ(ConvertTcm(TestData("tcm/quirks.tcm")).book, TestData("tcm/quirks.asc"));
 }
