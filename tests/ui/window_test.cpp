@@ -1,25 +1,25 @@
-// The windows driven as a surveyor would: the settings kept between sessions,
-// choosing a file in the lists, computing it to the summary, a run stopped
-// underway; the data editor and the viewer, TCVN3 files shown in Unicode and
-// saved back byte for byte with their backups, unsaved edits never dropped
-// unasked; the find and replace steps.
-#include <QCheckBox>
-#include <QComboBox>
-#include <QFileDialog>
-#include <QLineEdit>
+// The main window driven as a surveyor would: the settings kept between
+// sessions; choosing a file in the lists; computing it to the summary, which
+// leads to the error report; a run stopped underway; the numbers typed read
+// as the batch command reads them; unsaved edits of the field book never
+// computed unasked; files that fail or cannot be written; the keyboard.
 #include <QMessageBox>
 #include <QMimeData>
 #include <QPlainTextEdit>
+#include <QProgressBar>
+#include <QTextBrowser>
 #include <QtTest>
+#include <sstream>
 #include <tuple>
 
+#include "cli/cli.h"
 #include "core/messages.h"
+#include "core/typed_numbers.h"
 #include "support.h"
 #include "tests/generated_book.h"
-#include "ui/dialog.h"
+#include "ui/nhapsdo.h"
 #include "ui/openfile.h"
 #include "ui/runthread.h"
-#include "ui/timthay.h"
 
 using namespace kavu;
 using namespace kavu::ui;
@@ -35,37 +35,15 @@ void ClickFile(MainWindow& w, const char* name, bool twice = false) {
   if (twice) QTest::mouseDClick(list->viewport(), Qt::LeftButton, {}, at);
 }
 
-// A find window on one text box, the given text selected, answered by a
-// person; presses its buttons in turn: f "Tìm tiếp", r "Thay thế", a "Thay
-// tất cả", and ticks c "match case" and w "whole words".
-struct Bench {
-  Person person;
-  Asker ask;
-  QPlainTextEdit text;
-  Timthay find{ask, [this](int) { return &text; }};
+int BatchExit(const std::vector<std::string>& args) {
+  const std::vector<std::string_view> views(args.begin(), args.end());
+  std::ostringstream out, err;
+  return RunCli(views, out, err, false);
+}
 
-  Bench(const char* content, const char* needle, int start, int length, const char* presses,
-        const char* replacement = "X") {
-    ask.setHook(person.hook());
-    text.setPlainText(Q(content));
-    find.open(1);
-    QTextCursor cursor = text.textCursor();
-    cursor.setPosition(start);
-    cursor.setPosition(start + length, QTextCursor::KeepAnchor);
-    text.setTextCursor(cursor);
-    Child<QLineEdit>(find, "txttim")->setText(Q(needle));
-    Child<QLineEdit>(find, "txtthay")->setText(Q(replacement));
-    for (const char* key = presses; *key != 0; ++key) {
-      if (*key == 'c' || *key == 'w') {  // match case, whole words
-        Child<QCheckBox>(find, *key == 'c' ? "chon2" : "chon1")->setChecked(true);
-      } else {
-        Child<QPushButton>(find, *key == 'f' ? "tim" : *key == 'r' ? "thay1" : "thay2")->click();
-      }
-    }
-  }
-  int selStart() const { return text.textCursor().selectionStart(); }
-  int selLength() const { return text.textCursor().selectionEnd() - selStart(); }
-};
+bool IsSummary(const Question& question) {
+  return question.text.startsWith(Q(msg::kTotalStations));
+}
 
 }  // namespace
 
@@ -194,158 +172,204 @@ class WindowTest : public QObject {
     QVERIFY(desk.ended);
   }
 
-  void savesKeepEveryByteAndABackup() {
-    // "TR Ba Đình" in TCVN3: Đ is 0xA7, ì 0xD7; lone CRs end lines too.
-    QCOMPARE(DecodeForScreen("TR Ba \xA7\xD7nh\r\nx\ry"), Q("TR Ba Đình\nx\ny"));
-    // Every byte but the line ends (0xA0, the no-break space, among them).
-    QByteArray bytes;
-    for (int b = 1; b < 256; ++b) {
-      if (b != '\r' && b != '\n') bytes.append(static_cast<char>(b));
-      if (b % 32 == 0) bytes.append("\r\n");
-    }
-    bytes.append("\r\n");
-    const QByteArray report = "report\r\n" + bytes;
-    Editing desk({{"job1.asc", bytes}, {"job2.asc", "two\r\n"}, {"job1.err", report}}, "job1.asc");
-    desk.press(desk.w.editor(), "ghi");  // saved unchanged: byte for byte the same
-    QCOMPARE(desk.person.asked.back().text, Q(kOverwrite));
-    QVERIFY(desk.person.asked.back().defaultNo);
-    QCOMPARE(desk.read("job1.asc"), bytes);
-    // An edit, another file clicked meanwhile: the file opened gets it, with
-    // its last line ended; the backup holds the first save.
-    desk.click("job2.asc");
-    desk.save(Q("TR Ba Đình 1.50\nDKD DC02"));
-    QCOMPARE(desk.read("job1.asc"), QByteArray("TR Ba \xA7\xD7nh 1.50\r\nDKD DC02\r\n"));
-    QCOMPARE(desk.read("job1.bak"), bytes);
-    desk.person.answers = {MsgAnswer::No};  // No leaves the file as it is
-    desk.save(QStringLiteral("gone"));
-    QCOMPARE(desk.read("job1.asc"), QByteArray("TR Ba \xA7\xD7nh 1.50\r\nDKD DC02\r\n"));
-    // The viewer's backup keeps the whole name, beside the editor's.
-    desk.view("job1.err");
-    desk.press(desk.w.viewer(), "ghixem");
-    QCOMPARE(desk.read("job1.err"), report);
-    QCOMPARE(desk.read("job1.err.bak"), report);
-    QCOMPARE(desk.read("job1.bak"), bytes);
-  }
-
-  // A backup opened in the editor keeps its old content; a save that cannot
-  // be made (its scratch name taken by a folder) leaves the files.
-  void backupsOfBackupsAndSavesThatCannotBeMade() {
-    Editing desk({{"job1.bak", "old\r\n"}}, "job1.bak");
-    desk.save(QStringLiteral("new"));
-    QCOMPARE(desk.read("job1.bak"), QByteArray("new\r\n"));
-    QCOMPARE(desk.read("job1.bak.bak"), QByteArray("old\r\n"));
-    QVERIFY(QDir(desk.work.path()).mkpath("job1.bak.kavu-new/keep"));
-    desk.save(QStringLiteral("newer"));
-    QCOMPARE(desk.person.asked.back().icon, MsgIcon::Critical);
-    QVERIFY(desk.person.asked.back().text.startsWith(Q(msg::kCannotWrite)));
-    QCOMPARE(desk.read("job1.bak"), QByteArray("new\r\n"));
-    QCOMPARE(desk.read("job1.bak.bak"), QByteArray("old\r\n"));
-  }
-
-  // Every way out of the editor and of the viewer (Esc, its Thoat button,
-  // its close box, the program's exit), with each answer.
-  void unsavedEditsAreNeverDroppedUnasked() {
-    for (int k = 0; k < 24; ++k) {
-      const bool viewer = k >= 12;
-      const int way = k / 3 % 4;
-      const MsgAnswer answer = std::array{MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}[k % 3];
-      Editing desk({{"job1.asc", "book\r\n"}, {"job1.err", "report\r\n"}}, "job1.asc");
-      TextWindow& window = desk.window(viewer, "job1.err");
-      const char* name = viewer ? "job1.err" : "job1.asc";
-      window.findChild<QPlainTextEdit*>()->appendPlainText(QStringLiteral("edited"));
-      desk.person.answers = {answer};
-      if (way == 3) desk.person.answers.push_front(MsgAnswer::Yes);  // the program's own question
-      const QByteArray before = desk.read(name), what = QByteArray::number(k);
-      if (way == 0) QTest::keyClick(&window, Qt::Key_Escape);
-      if (way == 1) desk.press(window, "thoat");
-      if (way == 2) window.close();
-      if (way == 3) desk.press(desk.w, "thoat");
-      const QString question = Q(kSaveChanges) + Native(desk.path(name)) + "?";
-      QVERIFY2(!desk.person.asked.empty() && desk.person.asked.back().text == question, what);
-      const bool stays = answer == MsgAnswer::Cancel;
-      QVERIFY2(window.isVisible() == stays && (way < 3 || desk.ended != stays), what);
-      QVERIFY2((desk.read(name) == before) != (answer == MsgAnswer::Yes), what);
-    }
-  }
-
-  // Ctrl+F opens the find window on the editor, F3 finds on, Ctrl+S saves; the
-  // margin with the line numbers and the standard boxes in Vietnamese, in
-  // pictures beside the build.
-  void keysLineNumbersAndVietnameseBoxes() {
-    QByteArray book;
-    for (int i = 1; i <= 120; ++i)
-      book += "P" + QByteArray::number(i) + " 0 10.000 0900000 1.50\r\n";
-    Editing desk({{"job1.asc", book}}, "job1.asc");
-    Suasl& editor = desk.w.editor();
-    editor.resize(560, 420);
-    editor.activateWindow();
-    QVERIFY(QTest::qWaitForWindowActive(&editor));
-    QTest::keyClick(editor.txtsuasl(), Qt::Key_F, Qt::ControlModifier);
-    Child<QLineEdit>(desk.w.finder(), "txttim")->setText(QStringLiteral("P12 "));
-    QTest::keyClick(editor.txtsuasl(), Qt::Key_F3);
-    editor.txtsuasl()->insertPlainText(QStringLiteral("P12a "));
-    QTest::keyClick(editor.txtsuasl(), Qt::Key_S, Qt::ControlModifier);
-    QVERIFY(desk.read("job1.asc").contains("\r\nP12a 0 10.000"));
-    editor.txtsuasl()->centerCursor();
-    QVERIFY(editor.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-editor-line-numbers.png")));
-
-    QMessageBox box;
-    const QString question = Q(kSaveChanges) + QStringLiteral("/data/job1.asc?");
-    SetUpMessageBox(box, {question, MsgIcon::Question, MsgButtons::YesNoCancel, false, {}, {}});
-    QCOMPARE(box.button(QMessageBox::Cancel)->text(), Q("&Hủy"));
-    box.show();
-    QVERIFY(box.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-save-question.png")));
-    QFileDialog dialog(nullptr, Q(kViewFile), desk.work.path());
-    SetUpFileDialog(dialog, {Q(kErrFiles), Q(kAllFiles)});
-    QCOMPARE(dialog.labelText(QFileDialog::LookIn), Q("Tìm trong:"));
-    dialog.show();
-    QApplication::processEvents();
-    QVERIFY(dialog.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-file-dialog.png")));
-  }
-
-  // A find step searches from one past the start of the selection; replace
-  // works on the match the user sees, then shows the next; replace all on
-  // every match from the caret on, in one step of undo, the caret behind the
-  // last, and tells how many. Not found, Yes to "find on?" goes back to the top.
-  void findAndReplace() {
-    struct Case {
-      const char *text, *needle;
-      int start, length;  // the selection before
-      const char *presses, *result;
-      int selStart, selLength;     // the selection after
-      const char* told = nullptr;  // the message shown
-      const char* with = "X";
+  // The same texts give the same answer in the window and the batch command;
+  // a refused one names its box, takes the focus there and writes nothing;
+  // read ones give the same drawing.
+  void typedNumbersReadAsTheBatchCommandReadsThem() {
+    const struct {
+      const char *scale, *height, *decimals;
+      const char* box;  // the box refused, or none
+    } cases[] = {
+        {"1:500", "2,5", "3", nullptr},   {"1/2000", " 1.5 ", "2", nullptr},
+        {"1:5OO", "2.0", "2", "TyleTXT"}, {"500", "2,5,0", "2", "Htxt"},
+        {"1.000", "2", "2", "TyleTXT"},   {"500", "0", "2", "Htxt"},
+        {"500", "2", "hai", "txtSoleDC"},
     };
-    for (const Case& c : {
-             Case{"abc abc", "abc", 0, 0, "f", "abc abc", 4, 3},
-             Case{"xaaa", "aa", 1, 2, "f", "xaaa", 2, 2},
-             Case{"x ĐƯỜNG làng", "đường", 0, 0, "f", "x ĐƯỜNG làng", 2, 5},  // case folded
-             Case{"x ABC", "abc", 0, 0, "cf", "x ABC", 0, 0},                 // unless asked
-             Case{"abc abc", "abc", 5, 0, "f", "abc abc", 0, 0},
-             Case{"x concat cat", "cat", 0, 0, "wf", "x concat cat", 9, 3},  // whole words
-             Case{"a-a-a", "a", 0, 0, "rr", "X-a-a", 2, 1},
-             Case{"abc abc", "abc", 0, 0, "fr", "abc X", 5, 0},
-             Case{"abc abc", "abc", 1, 2, "r", "abc abc", 4, 3},  // no match selected
-             Case{"aab", "a", 0, 1, "r", "ab", 0, 1, nullptr, ""},
-             Case{"a-a-a", "a", 2, 1, "a", "a-X-X", 5, 0, "Đã thay 2 chỗ."},
-             Case{"a-a-a", "a", 0, 0, "a", "X-X-X", 5, 0, "Đã thay 3 chỗ."},
-             Case{"Đường ĐƯỜNG", "đường", 0, 0, "a", "X X", 3, 0, "Đã thay 2 chỗ."},
-             Case{"abc abc", "abc", 5, 0, "a", "abc abc", 5, 0, "Không tìm thấy chỗ nào để thay."},
-         }) {
-      Bench bench(c.text, c.needle, c.start, c.length, c.presses, c.with);
-      QCOMPARE(bench.text.toPlainText(), Q(c.result));
-      QCOMPARE(bench.selStart(), c.selStart);
-      QCOMPARE(bench.selLength(), c.selLength);
-      if (c.told != nullptr) {
-        QCOMPARE(bench.person.asked.size(), std::size_t{1});
-        QCOMPARE(bench.person.asked[0].text, Q(c.told));
-        QVERIFY(bench.find.isVisible());
+    for (const auto& c : cases) {
+      Desk desk;
+      desk.w.show();
+      QVERIFY(desk.example());
+      Child<QComboBox>(desk.w, "TyleTXT")->setCurrentText(QLatin1String(c.scale));
+      Child<QLineEdit>(desk.w, "Htxt")->setText(QLatin1String(c.height));
+      Child<QLineEdit>(desk.w, "txtSoleDC")->setText(QLatin1String(c.decimals));
+      Child<QCheckBox>(desk.w, "fdxf")->click();
+      const QStringList before = QDir(desk.work.path()).entryList(QDir::Files);
+      desk.w.tinh_Click();
+      const QStringList after = QDir(desk.work.path()).entryList(QDir::Files);
+      QVERIFY(QFile::copy(desk.path("job1.asc"), desk.path("batch.asc")));
+      QCOMPARE(BatchExit({"--dxf", "--scale", c.scale, "--text-height", c.height,
+                          "--height-decimals", c.decimals, desk.path("batch.asc").toStdString()}),
+               c.box != nullptr ? kExitUsage : kExitOk);
+      if (c.box == nullptr) {
+        QVERIFY(IsSummary(desk.person.asked.back()) && !desk.read("job1.dxf").isEmpty());
+        QCOMPARE(desk.read("job1.dxf"), desk.read("batch.dxf"));
+        continue;
       }
+      QCOMPARE(desk.person.asked.size(), std::size_t{1});
+      QCOMPARE(desk.person.asked.back().text,
+               Q(TypedRefusalMessage(ReadRunNumbers(c.scale, c.height, c.decimals))));
+      QCOMPARE(after, before);
+      // The box itself, or the text box of the scale's list box.
+      const QWidget* focused = desk.w.focusWidget();
+      QVERIFY2(
+          focused != nullptr && (focused->objectName() == QLatin1String(c.box) ||
+                                 focused->parentWidget()->objectName() == QLatin1String(c.box)),
+          c.box);
     }
-    Bench all("aa-a", "a", 0, 0, "a", "bb");
-    QCOMPARE(all.text.toPlainText(), QStringLiteral("bbbb-bb"));
-    all.text.undo();
-    QCOMPARE(all.text.toPlainText(), QStringLiteral("aa-a"));
+  }
+
+  // Unsaved edits of the field book to compute: Có saves and computes them,
+  // Không computes the file on disk and keeps the edits, Hủy computes nothing.
+  void unsavedEditsAreSavedLeftOrNotComputed() {
+    for (const MsgAnswer answer : {MsgAnswer::Yes, MsgAnswer::No, MsgAnswer::Cancel}) {
+      Desk desk;
+      desk.w.show();
+      QVERIFY(desk.example());
+      desk.w.suasolieu_Click();
+      QPlainTextEdit* text = desk.w.editor().txtsuasl();
+      const QByteArray onDisk = desk.read("job1.asc");
+      QTextCursor cursor = text->document()->find(QStringLiteral("DC01 1.45"));
+      QVERIFY(!cursor.isNull());
+      cursor.insertText(QStringLiteral("DC01 1.55"));
+      desk.person.answers = {answer};
+      desk.w.tinh_Click();
+      QCOMPARE(desk.person.asked.at(0).text.startsWith(Q(kSaveChanges)), true);
+      QCOMPARE(desk.person.asked.at(0).buttons, MsgButtons::YesNoCancel);
+      const bool computed = desk.person.asked.size() > 1 && IsSummary(desk.person.asked.back());
+      QCOMPARE(computed, answer != MsgAnswer::Cancel);
+      QCOMPARE(desk.read("job1.asc") == onDisk, answer != MsgAnswer::Yes);
+      QCOMPARE(text->document()->isModified(), answer != MsgAnswer::Yes);
+      QCOMPARE(QFileInfo::exists(desk.path("job1.txt")), computed);
+    }
+  }
+
+  // A run with errors offers the error report, which opens in the viewer;
+  // behind the summary the run's progress and stop button are gone. A run
+  // without errors offers none.
+  void theSummaryLeadsToTheErrorReport() {
+    for (const bool errors : {true, false}) {
+      Desk desk;
+      desk.w.show();
+      QVERIFY(desk.example(errors ? "P99 0901500\r\n" : ""));
+      bool offered = false, runControlsShown = true;
+      desk.w.asker().setHook([&](const Question& question) {
+        desk.person.asked.push_back(question);
+        if (!IsSummary(question)) return MsgAnswer::Ok;
+        runControlsShown = Child<QProgressBar>(desk.w, "tiendo")->isVisible() ||
+                           Child<QPushButton>(desk.w, "dung")->isVisible();
+        offered = bool(question.viewReport);
+        if (question.viewReport) {
+          QMessageBox box;
+          SetUpMessageBox(box, question);
+          box.show();
+          QApplication::processEvents();
+          box.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-summary-errors.png"));
+          question.viewReport();
+        }
+        return MsgAnswer::Yes;
+      });
+      desk.w.tinh_Click();
+      QVERIFY(IsSummary(desk.person.asked.back()));
+      QVERIFY(!runControlsShown);
+      QCOMPARE(offered, errors);
+      QCOMPARE(desk.w.viewer().isVisible(), errors);
+      if (errors) {
+        QCOMPARE(QFileInfo(desk.w.viewer().file()).fileName(), QStringLiteral("job1.err"));
+        QPlainTextEdit* report = desk.w.viewer().txtxem();
+        QVERIFY(report->toPlainText().contains(QLatin1String("P99")));
+        // A double click on its line opens the field book at the record, selected.
+        const QTextCursor at = report->document()->find(QStringLiteral("P99"));
+        QVERIFY(!at.isNull());
+        QTest::mouseDClick(report->viewport(), Qt::LeftButton, {}, report->cursorRect(at).center());
+        QVERIFY(desk.w.editor().isVisible());
+        QCOMPARE(desk.w.editor().txtsuasl()->textCursor().selectedText(),
+                 QStringLiteral("P99 0901500"));
+      }
+      QVERIFY(Child<QPushButton>(desk.w, "bando")->isEnabled());
+    }
+  }
+
+  // A file that cannot be computed leaves the recent list, and the title
+  // says no more that the run is at work.
+  void aFailedFileLeavesTheRecentList() {
+    Desk desk;
+    desk.w.show();
+    QVERIFY(desk.example());
+    desk.write("empty.asc", "");
+    QVERIFY(desk.w.chooseFile(desk.path("empty.asc")));
+    QVERIFY(desk.w.recentFiles().contains(Native(desk.path("empty.asc"))));
+    desk.w.tinh_Click();
+    QCOMPARE(desk.w.lastRun().outcome, RunOutcome::NotStarted);
+    QVERIFY(!desk.w.recentFiles().contains(Native(desk.path("empty.asc"))));
+    QVERIFY(desk.w.recentFiles().contains(Native(desk.path("job1.asc"))));
+    QCOMPARE(desk.w.windowTitle(), Q(msg::kProgramTitle));
+  }
+
+  // An instrument file whose field book cannot be written is computed all the
+  // same, and the file box stays on it: no field book stands beside it.
+  void anUnwrittenConversionKeepsTheInstrumentFile() {
+    Desk desk;
+    desk.w.show();
+    QVERIFY(QFile::copy(QStringLiteral(KAVU_EXAMPLES "/instruments/job-sdr.sdr"),
+                        desk.path("job.sdr")));
+    QVERIFY(QDir(desk.work.path()).mkdir(QStringLiteral("job.asc")));
+    QVERIFY(desk.w.chooseFile(desk.path("job.sdr")));
+    desk.w.tinh_Click();
+    QCOMPARE(desk.w.lastRun().outcome, RunOutcome::Completed);
+    QVERIFY(!desk.w.lastRun().unwritable.empty());
+    QCOMPARE(Child<QLineEdit>(desk.w, "txtfile")->text(), Native(desk.path("job.sdr")));
+    // The summary names it with its reason under a warning, and no error
+    // report, since the run found no error.
+    const Question& summary = desk.person.asked.back();
+    QCOMPARE(summary.icon, MsgIcon::Exclamation);
+    QVERIFY2(summary.text.contains(Q(msg::kCannotWrite) + Native(desk.path("job.asc")) + " (" +
+                                   Q(msg::kIsAFolder) + ")") &&
+                 !summary.text.contains(QLatin1String(".err")),
+             qPrintable(summary.text));
+  }
+
+  // No to "continue?" and Hủy to saving the editor's edits: the program stays
+  // and its map button works.
+  void cancellingTheWayOutKeepsTheMap() {
+    Desk desk;
+    desk.w.show();
+    QVERIFY(desk.example());
+    desk.write("other.asc", "TR A 1 2 3\r\n");
+    desk.w.suasolieu_Click();
+    desk.w.editor().openFile(desk.path("other.asc"), desk.path("other"), desk.work.path(),
+                             QStringLiteral("TR A 1 2 3\n"));
+    desk.w.editor().txtsuasl()->appendPlainText(QStringLiteral("TR B 4 5 6"));
+    desk.person.answers = {MsgAnswer::No, MsgAnswer::Cancel};
+    desk.w.tinh_Click();
+    QVERIFY(!desk.ended);
+    QVERIFY(desk.w.isVisible());
+    QVERIFY(Child<QPushButton>(desk.w, "bando")->isEnabled());
+  }
+
+  // Every option explains itself; no two controls share an access key; the
+  // buttons are reached with Tab in the order they stand; the header form
+  // opens from its button.
+  void theWindowWorksFromTheKeyboard() {
+    Desk desk;
+    desk.w.show();
+    const QStringList faults = KeyboardFaults(desk.w, true);
+    QVERIFY2(faults.isEmpty(), qPrintable(faults.join(QLatin1Char('\n'))));
+    // The map button comes before the exit button.
+    QWidget* at = Child<QPushButton>(desk.w, "tinh");
+    QStringList order;
+    for (int i = 0; i < 8; ++i, at = at->nextInFocusChain()) order << at->objectName();
+    QVERIFY2(order.indexOf(QStringLiteral("bando")) < order.indexOf(QStringLiteral("thoat")),
+             qPrintable(order.join(QLatin1Char(' '))));
+    Child<QPushButton>(desk.w, "nhapsdoButton")->click();
+    QVERIFY(desk.w.headerFormLoaded() && desk.w.headerForm().isVisible());
+    QVERIFY(desk.w.headerForm().grab().save(QStringLiteral(KAVU_PICTURES "/kavu-header-form.png")));
+    QVERIFY(desk.w.grab().save(QStringLiteral(KAVU_PICTURES "/kavu-main-options.png")));
+    // The help lists the instrument files from the table of formats.
+    Child<QPushButton>(desk.w, "trogiup")->click();
+    QVERIFY(desk.w.helpWindow() != nullptr);
+    const QString help = Child<QTextBrowser>(*desk.w.helpWindow(), "helptext")->toPlainText();
+    QVERIFY2(help.contains(QStringLiteral("Số liệu FieldBook SDR (.sdr)")), qPrintable(help));
+    QVERIFY(help.contains(QStringLiteral("Topcom 226 column file (.tcm)")));
   }
 };
 
