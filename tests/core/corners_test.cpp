@@ -6,16 +6,14 @@
 #include <cmath>
 #include <filesystem>
 #include <regex>
-#include <sstream>
 #include <string>
 #include <string_view>
 #include <vector>
 
-#include "cli/cli.h"
 #include "core/messages.h"
 #include "core/station.h"
 #include "core/tcvn3.h"
-#include "tests/support.h"
+#include "tests/cli/cli_support.h"
 
 namespace kavu {
 namespace {
@@ -48,11 +46,8 @@ Outcome Compute(std::string_view book, std::vector<std::string> options = {},
   fs::create_directories(run.folder);
   const fs::path file = run.folder / ("job" + std::string(extension));
   WriteBytes(file, std::string(book));
-  options.insert(options.begin(), file.string());
-  options.push_back("--seed=5");
-  const std::vector<std::string_view> args(options.begin(), options.end());
-  std::ostringstream out, err;
-  run.code = RunCli(args, out, err, false);
+  options.insert(options.end(), {file.string(), "--seed=5"});
+  run.code = testing::Cli(options).code;
   return run;
 }
 
@@ -61,17 +56,12 @@ std::string Book(std::string_view body) {
 }
 
 // A book's corner and what its products must show; the error report is
-// compared whole after its head. Orientation distance against the scale's
-// tolerance: 0.02 m up to 1:500, 0.05 m to 1:2000, 0.3 m below 1:5000, 2 m
-// beyond, a difference equal to it reported. Entry checks (name in 12
-// columns): 1234560 has 60 seconds; 1234559.9 rounds to the whole 1234560 for
-// minutes but keeps 59.9 seconds; over 2000 m is checked by the height and
-// again by the position. Values below 1 m are written without a 0 before the
-// point; the reading 1.45 (0 00 01.45) is decoded as 1.45 x 100.00001 =
-// 1.5000... seconds, shown as the even 02; reading about 0 points at the
-// orientation, due south: X = 1000 - 0.5, H = 10 + 1.5 - 0.5. The .txt
-// heights (11.5 and, prism -1.25, 12.75) to the typed decimals, ties to even,
-// no trailing zeros, a negative count as 0.
+// compared whole after its head. The orientation distance against the
+// scale's tolerance (0.02 m to 1:500, 0.05 m to 1:2000, 0.3 m below 1:5000,
+// 2 m beyond), a difference equal to it reported; 60 seconds or minutes and
+// over 2000 m reported, 1234559.9 rounded for minutes only; 0 00 01.45 read
+// as 1.5000... seconds (02, the even second), due south at 0.5 m; the .txt
+// heights to the typed decimals, ties to even, a negative count as 0.
 TEST(Corners, BooksAndWhatTheirProductsShow) {
   struct Case {
     std::vector<std::string> options;
@@ -137,8 +127,8 @@ TEST(Corners, BooksAndWhatTheirProductsShow) {
   }
 }
 
-// The azimuth is held in single precision, so exact quarter turns come out a
-// few millionths of a degree off, as the office's products always showed.
+// The azimuth is held in single precision: quarter turns come out a few
+// millionths of a degree off, as the office's products always showed.
 TEST(Corners, SinglePrecisionAzimuthsAndDistance) {
   RunState st;
   st.xTR = st.yTR = 1000;
@@ -158,11 +148,9 @@ TEST(Corners, SinglePrecisionAzimuthsAndDistance) {
   EXPECT_EQ(st.rad, 3.14159265358979);
 }
 
-// The check record on KC3. Orientation azimuth (KC2 to KC1) 0; azimuth from
-// KC3 to KC1 is 270, so the check reading should be 270 - 0. With the
-// orientation on KC3 instead (azimuth 270) and the check on KC2 (azimuth 0),
-// 0 - 270 wraps to 90. A recorded reading is kept; a reading of 0 is made up
-// within 32 seconds of the computed one (packed, without leading zeros).
+// The check reading: on KC3 seen oriented on KC2 it is 270, on KC2 oriented
+// on KC3 0 - 270 wraps to 90. A recorded reading is kept; a reading of 0 is
+// made up within 32 seconds of the computed one.
 TEST(Corners, CheckReadingKeptOrMadeUpWithinHalfAMinute) {
   struct Case {
     const char* orientation;
@@ -186,9 +174,8 @@ TEST(Corners, CheckReadingKeptOrMadeUpWithinHalfAMinute) {
   }
 }
 
-// --kind overrides the extension; --text-height times the scale / 1000 is
-// the label height in the drawing file (4 mm at 1:500 is 2 m, and 3 m for
-// the control points' labels, half as high again).
+// --kind overrides the extension; 4 mm labels at 1:500 are 2 m high in the
+// drawing, the control points' 3 m.
 TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
   const std::string book = Book("1 0 10 900000 1.5\r\n");
   EXPECT_EQ(Compute(book, {"--kind", "0", "--txt"}, ".dat").code, kExitOk);
@@ -201,14 +188,10 @@ TEST(Corners, KindAndTextHeightOfTheBatchCommand) {
   EXPECT_NE(dxf.find(" 40\r\n 3 \r\n"), std::string::npos) << dxf;
 }
 
-// A .gre file is an SDR recording: converted with its set-ups, then
-// computed. Every number fills its columns up to the next one, so a column
-// boundary one off changes a value: slope 1234 at zenith 89.5 is 1233.953 m
-// horizontal (1234 x sin 89.5); the reading 45, turned to the backsight read
-// at 45.5, wraps to 359 30 00 and the backsight itself reads 0; the prism
-// height and the height are kept as recorded; a description of two
-// characters does not name a point, and a listed backsight keeps its name
-// whatever its observation's note says.
+// A .gre file is an SDR recording, its numbers filling their columns up to
+// the next: 1234 at zenith 89.5 is 1233.953 m, 45 turned to the backsight at
+// 45.5 wraps to 359 30 00; heights kept as recorded; a description of two
+// characters names no point, nor renames a listed backsight.
 TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
   const std::string gre =
       "08KI0001  1000.000  1000.0000000010.00          KC1\r\n"
@@ -229,9 +212,8 @@ TEST(Corners, GreFileConvertedAsSdrColumnByColumn) {
             "3     3593000 1233.953   893000 000001.500 \r\n");
 }
 
-// What a body record is decided by its field count, "KT" in any case, and a
-// sixth field that names a peg: 3 characters or more, not all digits and
-// points.
+// A body record by its field count, "KT" in any case, and a sixth field that
+// names a peg (3 characters or more, not all digits and points).
 TEST(Corners, KindOfABodyRecord) {
   const std::vector<std::pair<std::vector<std::string_view>, BodyRecord>> cases = {
       {{"1", "0", "10", "900000"}, BodyRecord::TooFew},
