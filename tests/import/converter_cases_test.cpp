@@ -1,14 +1,13 @@
 // Short recordings of the converters' corners, each through a whole batch run
 // in a folder of its own: the lines its products must hold, the names they
-// must not list, and its error report. Expected values are worked out by
-// hand from the surveying rules.
+// must not list, and its error report, worked out by hand.
 #include <filesystem>
-#include <sstream>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "core/tcvn3.h"
+#include "tests/cli/cli_support.h"
 #include "tests/import/instrument_test_util.h"
 
 namespace kavu::testing {
@@ -87,10 +86,8 @@ struct Case {
 
 TEST(ConverterCases, ProductsOfEachCorner) {
   const Case cases[] = {
-      // Lines ending in a tab have an empty last field: station A, B due
-      // south of it, the points 10 m due west. Every word after the prism
-      // height keeps its blank in the .td1; the .txt always sets code and
-      // note off by one; the TRIDO book keeps the line as normalised.
+      // Lines ending in a tab have an empty last field: the points 10 m due
+      // west of A, every word after the prism height keeping its blank.
       {"tabs.asc",
        "TR A 1000.000 1000.000 10.000\r\nTR B 900.000 1000.000 10.000\r\nTR A 1.500\r\nDKD B\r\n"
        "P1 0900000 10.000 0900000 1.5\t\r\nP2 0900000 10.000 0900000 1.5\tN\t\r\n",
@@ -101,10 +98,8 @@ TEST(ConverterCases, ProductsOfEachCorner) {
         {".txt", "P2    1000.000    990.000            10 N "},
         {"TRIDO", "P1 0900000 10.000 0900000 1.5 "},
         {"TRIDO", "P2 0900000 10.000 0900000 1.5 N "}}},
-      // The set-up on 0012 (100, 200), listed by an 08KI without description,
-      // describes itself as TRAM, the name of 0013 (500, 600): it stays
-      // DKC0012. Backsight 0014 (100, 300) due east; 20 is shot 90 degrees on
-      // at 50 m: due south at (50, 200).
+      // The set-up on 0012, listed without description, describes itself as
+      // TRAM, 0013's name: it stays DKC0012, 20 due south of it at 50 m.
       {"setup-description.sdr",
        kSdr20 + Known("0013", "500.000", "600.000", "TRAM") + Known("0012", "100.000", "200.000") +
            Known("0014", "100.000", "300.000", "BS1") +
@@ -114,8 +109,7 @@ TEST(ConverterCases, ProductsOfEachCorner) {
        "",
        {{".asc", "TR DKC0012 1.500"}, {".txt", "20    50.000      200.000            10  "}}},
       // The 16-column layout's shot on the backsight is its orientation
-      // distance: 101 m against the 100 m of the coordinates is checked, and
-      // KC02 is no computed point.
+      // distance, 101 m checked against 100 m, no computed point.
       {"backsight.obs",
        WideScene("", "101.000"),
        "",
@@ -131,10 +125,8 @@ TEST(ConverterCases, ProductsOfEachCorner) {
        "",
        {{".txt", "P     5000.000    3050.000           10  "}},
        {"KC02"}},
-      // Face pairs where one face has no distance and the other a negative
-      // one: the distance is |SD sin Z| of the face that has one. From S
-      // (1000, 1000) on B 100 m north: P east at 50 m, Q north at 30 m (face 2
-      // first).
+      // Face pairs, one face without distance and the other negative: |SD sin
+      // Z| of the one that has it. P east of S at 50 m, Q north at 30 m.
       {"face-pairs.idx",
        "STN_ID \"S\"\r\nINST_HT 1.5;\r\n\r\n\r\n1,\"B\",1,0,90,100,1.5\r\n"
        "2,\"P\",1,90,90,,1.5\r\n3,\"P\",1,270,270,-50,1.5\r\n"
@@ -148,9 +140,8 @@ TEST(ConverterCases, ProductsOfEachCorner) {
        "2,\"P\",1,90,90,100,5\r\nEND SLOPE\r\n",
        "TR S 1000 1000 10\r\nTR B 1100 1000 10\r\n",
        {{".txt", "P     1000.000    1030.480           10  "}}},
-      // The identifier "538 " (a blank at its end) is the point 538 computed
-      // at (1000, 1050): the set-up on it is DKC538, found among the computed
-      // points, and 600 is shot from it 90 degrees on from DKC0001.
+      // The identifier "538 " is the point 538 computed at (1000, 1050): the
+      // set-up on it is DKC538, found among the computed points.
       {"padded-id.sdr",
        kSdr20 + Known("0001", "1000.000", "1000.000") + Known("0002", "1100.000", "1000.000") +
            Station("0001") + Backsight("0001", "0002") + Rec("03NM", {{5, "1.500"}}) +
@@ -173,9 +164,7 @@ TEST(ConverterCases, ProductsOfEachCorner) {
       WriteBytes(folder / "control.txt", c.control);
       args.insert(args.end(), {"--control-file", (folder / "control.txt").string()});
     }
-    const std::vector<std::string_view> views(args.begin(), args.end());
-    std::ostringstream out, err;
-    RunCli(views, out, err, false);
+    Cli(args);
 
     const std::string stem = file.stem().string();
     auto product = [&](const std::string& kind) {
