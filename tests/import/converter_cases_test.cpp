@@ -7,22 +7,12 @@
 #include <vector>
 
 #include "core/tcvn3.h"
-#include "tests/cli/cli_support.h"
 #include "tests/import/instrument_test_util.h"
 
 namespace kavu::testing {
 namespace {
 
 namespace fs = std::filesystem;
-
-// A record: its code, then texts placed at their columns (from 1).
-std::string Rec(std::string code, std::vector<std::pair<std::size_t, std::string>> fields) {
-  for (const auto& [column, text] : fields) {
-    if (code.size() < column - 1) code.resize(column - 1, ' ');
-    code.replace(column - 1, text.size(), text);
-  }
-  return code + "\r\n";
-}
 
 const std::string kSdr20 = "00NMSDR20     V03-05    01-Jan-24 08:00 111111\r\n";
 const std::string kSdr33 = "00NMSDR33     V04-04.02 01-Jan-24 08:00 111111\r\n";

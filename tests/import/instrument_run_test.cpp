@@ -1,7 +1,6 @@
-// Instrument files through a whole run: the example job of every kind,
-// converted by the batch command, computed, and a coordinate checked against
-// an azimuth and a reduced distance worked out here from the raw values; the
-// real recordings beside the tree.
+// Instrument files through a whole run: the example job of every kind, a
+// coordinate checked against an azimuth and a reduced distance worked out
+// here from the raw values; the real recordings beside the tree.
 #include <cmath>
 #include <map>
 #include <string>
@@ -68,11 +67,9 @@ TEST_F(InstrumentRun, ExampleJobsComputeToTheirShots) {
   }
 }
 
-// The real recordings, each run on its own as a surveyor drops it onto the
-// program, without a control file: what the file says of itself is the
-// expected result. Its known points reach the field book, the points it shot
-// again agree with its own coordinates, and what cannot be computed is
-// reported.
+// The real recordings, each run on its own without a control file: its known
+// points reach the field book, the points it shot again agree with its own
+// coordinates, and what cannot be computed is reported.
 struct Point {
   const char* name;
   double x, y;  // north, east
@@ -91,6 +88,9 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
     // coordinate text file must not list.
     std::vector<const char*> book = {}, not_computed = {};
   };
+  const std::vector<Point> stlev = {{"STLEV", 15102.106, 6594.363},
+                                    {"KRYSHA", 14783.699, 6463.655}};
+  const std::vector<const char*> fits = {"KHAC TOA DO", "khong co toa do"};
   const Case cases[] = {
       {"barnes-example.sdr",
        {{"DKC0001", 0, 0}, {"DKC0003", -14.791761, -168.03557}},
@@ -105,18 +105,18 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
        {{"101", -4.347, -6.794}, {"202", -2.422, 4.773}},
        {{"1011", -4.347, -6.794}, {"1012", -0.172, -6.773}},
        {},
-       {"KHAC TOA DO", "khong co toa do"}},
+       fits},
       // The angle-only shot on the backsight KRYSHA is its orientation
       // distance record (nothing to check), no point without distance.
       {"geoeasy-20151125.obs",
-       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
+       stlev,
        {},
        {},
        {"KHAC TOA DO", "khong co toa do", "khong co khoang cach"},
        {"KRYSHA        00000    0.000   801608 0.00000000 KRYSHA"},
        {"KRYSHA"}},
       {"geoeasy-sdr33-20151204.sdr",
-       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
+       stlev,
        {},
        {},
        {"KHAC TOA DO", "khong co toa do", "khong co khoang cach"},
@@ -130,11 +130,7 @@ TEST_F(RealRecordings, ComputeOnTheirOwn) {
        {"Diem: OR           khong co toa do"},
        {},
        {"OR            00000    0.000   851345  1.530 OR"}},
-      {"geoeasy-20151130.set",
-       {{"STLEV", 15102.106, 6594.363}, {"KRYSHA", 14783.699, 6463.655}},
-       {},
-       {},
-       {"KHAC TOA DO", "khong co toa do"}},
+      {"geoeasy-20151130.set", stlev, {}, {}, fits},
       // No observation at all: its known points only, and the run stops.
       {"tops-sokkia_sdr33.set", {{"00000031", 509.97, 937.274}, {"00000020", 506.797, 915.514}}},
   };

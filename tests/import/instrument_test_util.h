@@ -1,5 +1,5 @@
-// Reading the test data of the instrument converters, and a batch run of an
-// instrument file with the coordinates it computed.
+// Reading and writing the test data of the instrument converters, and a batch
+// run of an instrument file with the coordinates it computed.
 #pragma once
 
 #include <gtest/gtest.h>
@@ -7,17 +7,26 @@
 #include <cmath>
 #include <filesystem>
 #include <map>
-#include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
-#include "cli/cli.h"
 #include "core/lines.h"
 #include "core/numbers.h"
 #include "core/text.h"
-#include "tests/support.h"
+#include "tests/cli/cli_support.h"
 
 namespace kavu::testing {
+
+// A record of a column file: its code, then texts placed at their columns
+// (from 1).
+inline std::string Rec(std::string code, std::vector<std::pair<std::size_t, std::string>> fields) {
+  for (const auto& [column, text] : fields) {
+    if (code.size() < column - 1) code.resize(column - 1, ' ');
+    code.replace(column - 1, text.size(), text);
+  }
+  return code + "\r\n";
+}
 
 inline std::string TestData(const std::string& relative) {
   return FileBytes(std::filesystem::path(KAVU_TEST_DATA) / "import" / relative);
@@ -43,9 +52,7 @@ class InstrumentRunTest : public ::testing::Test {
   int Run(const std::filesystem::path& file, std::vector<std::string> args) {
     std::filesystem::copy_file(file, dir_ / file.filename());
     args.push_back((dir_ / file.filename()).string());
-    const std::vector<std::string_view> views(args.begin(), args.end());
-    std::ostringstream out, err;
-    return RunCli(views, out, err, false);
+    return Cli(args).code;
   }
 
   // Name -> X, Y of the coordinate text file (the last line of a name wins).

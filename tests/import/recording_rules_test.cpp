@@ -44,15 +44,6 @@ std::string Number(double value, std::size_t width) {
   return s;
 }
 
-// A record: its code, then fields placed at their columns.
-std::string Record(std::string code, std::vector<std::pair<std::size_t, std::string>> fields) {
-  for (const auto& [column, text] : fields) {
-    if (code.size() < column - 1) code.resize(column - 1, ' ');
-    code.replace(column - 1, text.size(), text);
-  }
-  return code + "\r\n";
-}
-
 // An SDR-family recording of the scene in a dialect: the known points, the
 // set-up on A with its backsight record, the prism height, the shots of B and P.
 std::string Recording(const Dialect& d) {
@@ -73,23 +64,23 @@ std::string Recording(const Dialect& d) {
   const std::size_t t = wide ? 21 : 9, sd = wide ? 37 : 13, z = wide ? 53 : 23, ha = wide ? 69 : 33;
 
   std::string file =
-      Record("00NM" + std::string(d.instrument) + "     V03-05    01-Jan-24 08:00 " + d.digits, {});
-  if (d.job != nullptr) file += Record("10NM" + std::string(d.job), {});
+      Rec("00NM" + std::string(d.instrument) + "     V03-05    01-Jan-24 08:00 " + d.digits, {});
+  if (d.job != nullptr) file += Rec("10NM" + std::string(d.job), {});
   for (const auto& [name, p] : {std::pair{"0001", kA}, std::pair{"0002", kB}}) {
     const auto [x, y] = d.east_north ? std::pair{p.y, p.x} : std::pair{p.x, p.y};
-    file += Record("08KI", {{c[0], id(name)}, {c[1], len(x)}, {c[2], len(y)}, {c[3], len(10)}});
+    file += Rec("08KI", {{c[0], id(name)}, {c[1], len(x)}, {c[2], len(y)}, {c[3], len(10)}});
   }
-  file += Record("02TP", {{c[0], id("0001")}, {c[4], len(1.5)}});
-  file += Record("07TP", {{c[0], id("0001")}, {t, id("0002")}, {z, reading(kCircleOnB)}});
-  file += Record("03NM", {{5, len(1.5)}});
+  file += Rec("02TP", {{c[0], id("0001")}, {c[4], len(1.5)}});
+  file += Rec("07TP", {{c[0], id("0001")}, {t, id("0002")}, {z, reading(kCircleOnB)}});
+  file += Rec("03NM", {{5, len(1.5)}});
   for (const auto& [target, slope, circle] :
        {std::tuple{"0002", Slope(std::hypot(kB.x - kA.x, kB.y - kA.y)), kCircleOnB},
         std::tuple{"0003", Slope(40), kCircleOnB + kTurn}}) {
-    file += Record("09F1", {{5, id("0001")},
-                            {t, id(target)},
-                            {sd, len(slope)},
-                            {z, angle(kZenith)},
-                            {ha, reading(circle)}});
+    file += Rec("09F1", {{5, id("0001")},
+                         {t, id(target)},
+                         {sd, len(slope)},
+                         {z, angle(kZenith)},
+                         {ha, reading(circle)}});
   }
   return file;
 }
