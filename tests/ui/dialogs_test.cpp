@@ -3,22 +3,8 @@
 // the save dialog of the map window and the program's open-file dialog show
 // no English text Qt asked to have translated, and the file lists write sizes
 // and dates (dd/mm/yyyy) in Vietnamese. Esc closes every side window.
-#include <QAbstractButton>
-#include <QAction>
-#include <QComboBox>
-#include <QDialogButtonBox>
-#include <QFileDialog>
-#include <QGroupBox>
-#include <QHeaderView>
-#include <QLabel>
-#include <QLineEdit>
-#include <QListView>
-#include <QMessageBox>
 #include <QMimeDatabase>
-#include <QPushButton>
-#include <QTabWidget>
 #include <QTranslator>
-#include <QTreeView>
 #include <QtTest>
 #include <functional>
 #include <map>

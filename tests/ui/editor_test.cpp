@@ -5,9 +5,6 @@
 // closes each window; the find and replace steps; the header form counts the
 // characters of its boxes and the sketch prints what it shows; every button
 // has a tip and an access key of its own.
-#include <QFileDialog>
-#include <QMessageBox>
-#include <QTextBlock>
 #include <QtTest>
 #include <string_view>
 

@@ -2,20 +2,9 @@
 // on the screen and in the pictures, a click showing the error lines and the
 // record; the exports read back; the field sketch on pages and in a PDF; the
 // window's keys, save dialogs, information pane, size and captions.
-#include <QImage>
-#include <QMenuBar>
 #include <QProcess>
-#include <QScreen>
-#include <QScrollBar>
-#include <QSplitter>
 #include <QStandardPaths>
-#include <QStatusBar>
 #include <QSvgRenderer>
-#include <QTextBlock>
-#include <QTextBrowser>
-#include <QToolBar>
-#include <QToolButton>
-#include <QToolTip>
 #include <QtTest>
 
 #include "core/tcvn3.h"

@@ -3,23 +3,8 @@
 // editor opened from it.
 #pragma once
 
-#include <QAbstractButton>
-#include <QApplication>
-#include <QByteArray>
-#include <QCheckBox>
-#include <QComboBox>
-#include <QDeadlineTimer>
-#include <QDialog>
-#include <QDir>
-#include <QFile>
-#include <QLabel>
-#include <QLineEdit>
-#include <QPushButton>
-#include <QSet>
-#include <QSettings>
-#include <QString>
-#include <QTemporaryDir>
-#include <QTimer>
+#include <QtTest>
+#include <QtWidgets>
 #include <deque>
 #include <functional>
 #include <initializer_list>

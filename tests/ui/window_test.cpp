@@ -3,11 +3,6 @@
 // leads to the error report; a run stopped underway; the numbers typed read
 // as the batch command reads them; unsaved edits of the field book never
 // computed unasked; files that fail or cannot be written; the keyboard.
-#include <QMessageBox>
-#include <QMimeData>
-#include <QPlainTextEdit>
-#include <QProgressBar>
-#include <QTextBrowser>
 #include <QtTest>
 #include <sstream>
 #include <tuple>
