@@ -13,22 +13,23 @@ constexpr std::optional<double> kRefused = std::nullopt;
 
 TEST(TypedNumber, ReadsPointOrCommaDecimalsAndNothingElse) {
   const std::vector<std::pair<std::string, std::optional<double>>> cases = {
-      {"2.5", 2.5},     {"2,5", 2.5},      {" \t2,5 ", 2.5},  {"-1,25", -1.25},
-      {"+3", 3},        {",5", 0.5},       {"5.", 5},         {"0012", 12},
+      {"2.5", 2.5},        {"2,5", 2.5},        {" \t2,5 ", 2.5},  {"-1,25", -1.25},
+      {"+3", 3},           {",5", 0.5},         {"5.", 5},         {"0012", 12},
       {"2,5,0", kRefused}, {"2.5,0", kRefused}, {"2 5", kRefused}, {"1e3", kRefused},
-      {"", kRefused},   {" ", kRefused},   {".", kRefused},   {"-", kRefused},
-      {"2mm", kRefused}, {"nan", kRefused}, {"inf", kRefused}, {"0x10", kRefused},
-      {"--2", kRefused}, {"2.5\n", kRefused}};
+      {"", kRefused},      {" ", kRefused},     {".", kRefused},   {"-", kRefused},
+      {"2mm", kRefused},   {"nan", kRefused},   {"inf", kRefused}, {"0x10", kRefused},
+      {"--2", kRefused},   {"2.5\n", kRefused}};
   for (const auto& [text, value] : cases) EXPECT_EQ(ReadTypedNumber(text), value) << text;
 }
 
 TEST(TypedNumber, ReadsAScaleAsMapsAreLabelled) {
   const std::vector<std::pair<std::string, std::optional<double>>> cases = {
-      {"500", 500},        {"1:500", 500},      {"1/500", 500},       {" 1 : 2000 ", 2000},
-      {"1000.5", 1000.5},  {"1:5OO", kRefused}, {"2:500", kRefused},  {":500", kRefused},
-      {"1:", kRefused},    {"1::500", kRefused}, {"0", kRefused},     {"-500", kRefused},
-      {"1:0", kRefused},   {"1.000", kRefused}, {"1:2,000", kRefused}, {"1,5", 1.5},
-      {"1:500 000", kRefused}, {"1", 1}};
+      {"500", 500},         {"1:500", 500},          {"1/500", 500},
+      {" 1 : 2000 ", 2000}, {"1000.5", 1000.5},      {"1:5OO", kRefused},
+      {"2:500", kRefused},  {":500", kRefused},      {"1:", kRefused},
+      {"1::500", kRefused}, {"0", kRefused},         {"-500", kRefused},
+      {"1:0", kRefused},    {"1.000", kRefused},     {"1:2,000", kRefused},
+      {"1,5", 1.5},         {"1:500 000", kRefused}, {"1", 1}};
   for (const auto& [text, value] : cases) EXPECT_EQ(ReadTypedScale(text), value) << text;
 }
 
