@@ -26,16 +26,9 @@ RunState StateFor(const fs::path& file) {
   return st;
 }
 
-// The field book holds every record kind and every report line: duplicate
-// control points within (KC1) and beyond (KC3) the tolerance, a 12-character
-// name, a line where a station was expected, tabs and runs of spaces, pegs
-// (CP1 later occupied as a station), orientation-distance and check records,
-// malformed, ignored and non-numeric lines, entry errors, a "DKC" reference,
-// a detail name over 12 characters (reported), a skipped block, a station
-// record without instrument height, a station with only a check record and an
-// orientation record on the last line. Every
-// expected file was checked line by line against the layouts, the coordinates
-// against an independent single-precision azimuth computation.
+// every-record/job.asc holds every record kind and every report line; its
+// products were checked line by line by hand, the coordinates against an
+// independent single-precision azimuth computation.
 TEST(Run, EveryRecordKindGivesTheHandCheckedProducts) {
   const fs::path folder = FreshFolder();
   fs::create_directories(folder / "data");

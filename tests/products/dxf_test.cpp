@@ -28,14 +28,10 @@ std::string Drawing(const Survey& survey, double labelHeight) {
   return FileBytes(path);
 }
 
-// Scale 1000, 2 mm: detail labels 2 m high, control labels 3 m, both 1 m north
-// and east of their point; drawing x is the easting. The control table holds a
-// TCVN3 name, a point looked up twice (drawn twice), a 12-character name,
-// small numbers written without their leading zero and coordinates that are
-// not numbers (drawn at 0); the details an empty name and exponent forms; a
-// peg is drawn among the control points, never as a detail point. Without
-// points, the section and the end only. A label height out of range makes
-// labels of height 0 on their point.
+// Labels 2 m high for details and 3 m for control points, 1 m north and east
+// of them, x the easting; control points named in TCVN3, twice, in 12
+// characters, with small or no numbers; pegs among the control points; no
+// points; a label height out of range gives labels of height 0.
 TEST(Dxf, ControlAndDetailPointsWithTheirLabels) {
   Survey survey;
   EXPECT_EQ(Drawing(survey, 2), Expected("dxf/no_points.dxf"));

@@ -57,13 +57,9 @@ RunState PegState(const std::filesystem::path& folder, int fcp, int fdc) {
   return st;
 }
 
-// The head with heights, then: a station with two pegs and no check record
-// (the second with a 13-character name, a distance that fills its column and
-// a zenith longer than it: each still set off by a space); a station without
-// pegs (nothing); a check record, a peg with a
-// note, then an 8-character reading that ends the block; a check record and
-// an 8-character reading on the first peg (station lines only). Station lines
-// carry no instrument height.
+// The head with heights; stations with and without pegs and check records, a
+// long peg name, distance and zenith each still set off by a space, readings
+// of 8 characters reported; station lines without instrument height.
 TEST(Pegs, HeadAndStationBlocks) {
   const auto folder = FreshFolder();
   RunState st = PegState(folder, 1, 1);
@@ -91,13 +87,10 @@ TEST(Pegs, HeadAndStationBlocks) {
   EXPECT_EQ(st.survey.TextOf(st.survey.report[1]), "Diem M9           nhap sai phan do");
 }
 
-// A seeded run writes the three products of a field book with every line
-// form: station 1 has detail points with 5, 6 and 7 fields (0-angle points
-// with words, a 13-character name, a note longer than 12), a peg and a check
-// record without a reading (made up from the draw); station 2 a check record
-// with its reading and two pegs; station 3 only an orientation distance
-// record, so no detail rows and no pegs. The draws follow the run order: check
-// record, then the station's sketch row.
+// A seeded run writes the sketch, pegs and drawing of a book with every line
+// form: details of 5, 6 and 7 fields, pegs, check records with and without a
+// reading (made up from the draw), a station with only an orientation
+// distance record.
 TEST(ProductsRun, SeededRunWritesSketchPegsAndDrawing) {
   const auto folder = FreshFolder();
   std::filesystem::copy_file(std::filesystem::path(KAVU_TEST_DATA) / "products/run/job.asc",
