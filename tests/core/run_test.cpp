@@ -109,5 +109,19 @@ TEST(Run, StopWorksUntilTheProductsAreInPlace) {
   }
 }
 
+// A typed number that cannot be read stops the run before anything is
+// converted or written, with the box's refusal.
+TEST(Run, AnUnreadableTypedNumberStartsNothing) {
+  const fs::path folder = FreshFolder();
+  fs::copy_file(kEveryRecord / "job.asc", folder / "job.asc");
+  RunState st = StateFor(folder / "job.asc");
+  st.TyleTXT = "1:5OO";
+  RecordingHost host;
+  EXPECT_EQ(tinh_Click(st, host).outcome, RunOutcome::NotStarted);
+  ASSERT_FALSE(host.messages.empty());
+  EXPECT_EQ(host.messages.back(), "Tỷ lệ bản đồ không đọc được: 1:5OO");
+  EXPECT_EQ(std::distance(fs::directory_iterator(folder), fs::directory_iterator{}), 1);
+}
+
 }  // namespace
 }  // namespace kavu
