@@ -2,7 +2,9 @@
 // itself (so that main's wiring and the process's limits count too).
 #pragma once
 
-#include <sys/wait.h>
+#if !defined(_WIN32)
+#include <sys/wait.h>  // the executable runs through a POSIX shell
+#endif
 
 #include <cstdlib>
 #include <filesystem>
@@ -34,6 +36,7 @@ inline std::string Quote(const std::string& s) {
   return q + "'";
 }
 
+#if !defined(_WIN32)
 // The executable with its output kept in dir; `shell` runs first in the same
 // shell (limits for the process, say).
 inline Outcome Exe(const std::vector<std::string>& args, const std::filesystem::path& dir,
@@ -46,5 +49,6 @@ inline Outcome Exe(const std::vector<std::string>& args, const std::filesystem::
   return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, FileBytes(dir / "stdout"),
           FileBytes(dir / "stderr")};
 }
+#endif
 
 }  // namespace kavu::testing
